@@ -1,0 +1,65 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_DIRECTIVES_CONDITIONALS_H
+#define UMPRE_DIRECTIVES_CONDITIONALS_H
+
+#include <string_view>
+
+#include "directives/conditional_stack.h"
+#include "expr/evaluator.h"
+#include "lex/reporter.h"
+#include "lex/scanner_stack.h"
+#include "lex/text_lexer.h"
+#include "macros/macro_expander.h"
+#include "macros/macro_table.h"
+
+namespace umpre {
+
+/// The six conditional directives, which act in active and in skipped text alike. Each reads what
+/// it needs of its line; the rest is text for the main loop.
+class Conditionals {
+public:
+    Conditionals(ScannerStack& sources, MacroTable& macros, MacroExpander& expander,
+                 TextLexer& lexer, Reporter& reporter) noexcept
+        : sources_(sources),
+          macros_(macros),
+          expander_(expander),
+          lexer_(lexer),
+          reporter_(reporter),
+          evaluator_(sources, macros, reporter) {}
+
+    /// Tells whether lines are being skipped.
+    [[nodiscard]] bool skipping() const noexcept { return groups_.skipping(); }
+
+    /// Carries out the directive of this word, which was just read. Returns false if it is not a
+    /// conditional one.
+    bool carryOut(TokenKind word);
+
+    /// A file begins, with no open groups.
+    void enterFileGroups() { groups_.enterFile(); }
+
+    /// A file ends: reports its open groups, once, and closes them.
+    void closeFileGroups();
+
+private:
+    enum class Wanted { Defined, Undefined };
+
+    void ifDirective();
+    void ifdefDirective(Wanted wanted, std::string_view missingName);
+    void elifDirective();
+    void elseDirective();
+    void endifDirective();
+    [[nodiscard]] bool openGroup();
+    void decideByCondition();
+
+    ScannerStack& sources_;
+    MacroTable& macros_;
+    MacroExpander& expander_;
+    TextLexer& lexer_;
+    Reporter& reporter_;
+    Evaluator evaluator_;
+    ConditionalStack groups_;
+};
+
+}  // namespace umpre
+
+#endif

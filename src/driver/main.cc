@@ -1,0 +1,62 @@
+// SPDX-License-Identifier: MIT
+#include <csignal>
+#include <fcntl.h>
+#include <unistd.h>
+
+#include "driver/command_line.h"
+#include "driver/output_file.h"
+#include "driver/preprocessor.h"
+
+#ifndef UMPRE_PLAIN_ROAD
+#define UMPRE_PLAIN_ROAD false
+#endif
+
+namespace {
+
+enum Status { kClean = 0, kErrors = 1, kScannerFailure = 2 };
+
+// A standard descriptor that is closed would be given to the next file opened. Standard output gets
+// one that cannot be written, so that what is lost is noticed.
+void openStandardDescriptors() {
+    for (int descriptor = STDIN_FILENO; descriptor <= STDERR_FILENO; ++descriptor) {
+        if (::fcntl(descriptor, F_GETFD) == -1) {
+            (void)::open("/dev/null", descriptor == STDOUT_FILENO ? O_RDONLY : O_RDWR);
+        }
+    }
+}
+
+// Ends the process as a failing machine division does, on every machine.
+void raiseArithmeticFault() {
+    sigset_t signals;
+    sigemptyset(&signals);
+    sigaddset(&signals, SIGFPE);
+    (void)::sigprocmask(SIG_UNBLOCK, &signals, nullptr);
+    (void)std::signal(SIGFPE, SIG_DFL);
+    (void)std::raise(SIGFPE);
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    openStandardDescriptors();
+    umpre::DescriptorSink errors(STDERR_FILENO);
+    umpre::OutputFile output;
+    umpre::RunOptions options;
+    options.plainRoad = UMPRE_PLAIN_ROAD;
+    umpre::Preprocessor preprocessor(errors, options);
+    auto result = umpre::RunResult::Errors;
+    if (umpre::parseCommandLine(preprocessor, {output, errors}, argc, argv)) {
+        result = preprocessor.run();
+    }
+    if (result == umpre::RunResult::ArithmeticFault) {
+        raiseArithmeticFault();
+    }
+    const bool isWritten = output.close();
+    if (!isWritten) {
+        (void)errors.write(output.failureMessage());
+    }
+    if (result == umpre::RunResult::ScannerFailure) {
+        return kScannerFailure;
+    }
+    return isWritten && result == umpre::RunResult::Clean ? kClean : kErrors;
+}

@@ -1,0 +1,195 @@
+// SPDX-License-Identifier: MIT
+#include "driver/preprocessor.h"
+
+#include <new>
+
+#include "expr/expr_value.h"
+#include "lex/scanner_failure.h"
+#include "macros/predefined_macros.h"
+
+namespace umpre {
+
+using enum TokenKind;
+
+Preprocessor::Preprocessor(ByteSink& errors, const RunOptions& options)
+    : options_(options),
+      sources_(*this, output_, diagnostics_, options),
+      diagnostics_(errors, sources_),
+      lexer_(options),
+      expander_(sources_, macros_, diagnostics_, lexer_),
+      conditionals_(sources_, macros_, expander_, lexer_, diagnostics_),
+      definitions_(sources_, macros_, diagnostics_),
+      inclusion_(sources_, expander_, lexer_, diagnostics_),
+      lineControl_(sources_, expander_, lexer_, output_, diagnostics_),
+      textReader_(output_, macros_.filter()) {
+    definePredefinedMacros(macros_);
+}
+
+bool Preprocessor::openSource(const std::string& sourceName, const std::string& messageName) {
+    if (!sources_.pushFile(sourceName, messageName)) {
+        diagnostics_.reportFatal("cannot open " + sourceName);
+        return false;
+    }
+    return true;
+}
+
+void Preprocessor::openText(const std::string& sourceName, std::string_view text) {
+    sources_.pushFileText(sourceName, text);
+}
+
+RunResult Preprocessor::run() {
+    RunResult result = RunResult::Clean;
+    try {
+        result = readAll();
+    } catch (const ScannerFailure& failure) {
+        diagnostics_.noteScannerFailure(failure.message);
+        result = RunResult::ScannerFailure;
+    } catch (const std::bad_alloc&) {
+        diagnostics_.noteScannerFailure("out of dynamic memory in yy_create_buffer()");
+        result = RunResult::ScannerFailure;
+    } catch (const ArithmeticFault&) {
+        result = RunResult::ArithmeticFault;
+    }
+    output_.flush();
+    return result;
+}
+
+RunResult Preprocessor::readAll() {
+    for (;;) {
+        while (readBytes()) {
+        }
+        if (output_.failed()) {
+            return RunResult::Errors;
+        }
+        if (sources_.peek() == END_OF_INPUT) {
+            break;
+        }
+        line();
+    }
+    conditionals_.closeFileGroups();
+    return diagnostics_.errorFlag() ? RunResult::Errors : RunResult::Clean;
+}
+
+// Reads lines as bytes and finishes the line that this stops in, if any. Returns false, at the
+// start of a line, when that line wants tokens.
+bool Preprocessor::readBytes() {
+    CppFileScanner* const file = byteSource();
+    if (file == nullptr || output_.failed()) {
+        return false;
+    }
+    if (conditionals_.skipping()) {
+        if (textReader_.skipText(*file) == TextReader::Stop::LineStart) {
+            return false;
+        }
+        endSkippedLine();
+    } else {
+        if (textReader_.copyText(*file, TextReader::Stop::LineStart)
+            == TextReader::Stop::LineStart) {
+            return false;
+        }
+        restOfTextLine();
+    }
+    return true;
+}
+
+// Returns the file that can be read as bytes now, or null.
+CppFileScanner* Preprocessor::byteSource() {
+    return options_.plainRoad ? nullptr : sources_.fileReadNow();
+}
+
+void Preprocessor::line() {
+    const std::string blanks = sources_.skipBlanks();
+    const Token first = sources_.next();
+    if (first.kind == HASH) {
+        directiveLine();
+    } else if (first.kind == NEWLINE) {
+        output_.endLine();
+    } else if (conditionals_.skipping()) {
+        endSkippedLine();
+    } else {
+        textLine(blanks, first);
+    }
+}
+
+// A word that stands for no conditional directive is looked at in active text only.
+void Preprocessor::directiveLine() {
+    sources_.skipBlanks();
+    const TokenKind word = sources_.next().kind;
+    if (conditionals_.carryOut(word)) {
+        return;
+    }
+    if (conditionals_.skipping()) {
+        endSkippedLine();
+    } else {
+        activeDirective(word);
+    }
+}
+
+void Preprocessor::activeDirective(TokenKind word) {
+    switch (word) {
+    case NEWLINE: break;
+    case KW_INCLUDE: inclusion_.includeDirective(); break;
+    case KW_DEFINE: definitions_.defineDirective(); break;
+    case KW_UNDEF: definitions_.undefDirective(); break;
+    case KW_LINE: lineControl_.lineDirective(); break;
+    case KW_ERROR: lineControl_.errorDirective(); break;
+    case KW_PRAGMA: lineControl_.pragmaDirective(); break;
+    default:
+        diagnostics_.reportError(
+            "the indicated directive is not a recognized preprocessing directive");
+        sources_.skipToEndOfLine();
+    }
+}
+
+void Preprocessor::textLine(std::string_view blanks, Token first) {
+    output_.syncTo(sources_.position());
+    output_.write(blanks);
+    if (first.kind != END_OF_INPUT) {
+        writeToken(first);
+        restOfTextLine();
+    }
+}
+
+void Preprocessor::restOfTextLine() {
+    while (!output_.failed()) {
+        CppFileScanner* const file = byteSource();
+        if (file != nullptr
+            && textReader_.copyText(*file, TextReader::Stop::InLine)
+                   == TextReader::Stop::LineStart) {
+            return;
+        }
+        const Token token = sources_.next();
+        if (token.kind == END_OF_INPUT) {
+            return;
+        }
+        if (token.kind == NEWLINE) {
+            output_.endLine();
+            return;
+        }
+        writeToken(token);
+    }
+}
+
+void Preprocessor::writeToken(const Token& token) {
+    output_.write(isName(token.kind) ? expander_.expandName(token.text) : token.text);
+}
+
+void Preprocessor::endSkippedLine() {
+    sources_.skipToEndOfLine();
+    output_.endLine();
+}
+
+void Preprocessor::fileEntered() {
+    conditionals_.enterFileGroups();
+    output_.writeLineMarker(sources_.position());
+}
+
+void Preprocessor::fileEnds() {
+    conditionals_.closeFileGroups();
+}
+
+void Preprocessor::fileResumed() {
+    output_.writeLineMarker(sources_.position());
+}
+
+}  // namespace umpre

@@ -1,0 +1,96 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_DRIVER_PREPROCESSOR_H
+#define UMPRE_DRIVER_PREPROCESSOR_H
+
+#include <string>
+#include <string_view>
+
+#include "directives/conditionals.h"
+#include "directives/definitions.h"
+#include "directives/inclusion.h"
+#include "directives/line_control.h"
+#include "driver/diagnostics.h"
+#include "lex/byte_sink.h"
+#include "lex/output_writer.h"
+#include "lex/run_options.h"
+#include "lex/scanner_stack.h"
+#include "lex/text_lexer.h"
+#include "lex/text_reader.h"
+#include "macros/macro_expander.h"
+#include "macros/macro_table.h"
+
+namespace umpre {
+
+/// How a run ended. All that was written before the end has gone to the output.
+enum class RunResult {
+    Clean,
+    Errors,           ///< at least one error was reported
+    ScannerFailure,   ///< the input could not be read on; the message was written
+    ArithmeticFault,  ///< a condition divides as no machine can
+};
+
+/// One run: reads the source from its first token to the end of the input and writes the result.
+class Preprocessor final : private FileEvents {
+public:
+    /// The sinks are borrowed. The predefined macros take their date and time from now.
+    explicit Preprocessor(ByteSink& errors, const RunOptions& options = {});
+
+    /// Enters an object-like macro unless the name is defined.
+    void defineMacro(std::string_view name, std::string_view text) {
+        macros_.defineMacro(name, text);
+    }
+
+    /// Adds a directory to search for included files, after those added before.
+    void addIncludeDirectory(std::string_view directory) {
+        inclusion_.addIncludeDirectory(directory);
+    }
+
+    /// Sets where the output goes; must be called before a source is opened.
+    void setOutput(ByteSink& output) { output_.redirect(output); }
+
+    /// Opens the source, standard input if the name is empty, and writes its first line marker. In
+    /// messages and markers it has the message name, unless that is empty. Returns false after
+    /// reporting that it cannot be opened.
+    [[nodiscard]] bool openSource(const std::string& sourceName, const std::string& messageName);
+    /// Reads a text as the source.
+    void openText(const std::string& sourceName, std::string_view text);
+
+    /// Reads the open source; to be called once.
+    [[nodiscard]] RunResult run();
+
+    /// Tells whether some of the output could not be written.
+    [[nodiscard]] bool outputFailed() const noexcept { return output_.failed(); }
+
+private:
+    void fileEntered() override;
+    void fileEnds() override;
+    void fileResumed() override;
+
+    [[nodiscard]] RunResult readAll();
+    [[nodiscard]] bool readBytes();
+    [[nodiscard]] CppFileScanner* byteSource();
+    void line();
+    void directiveLine();
+    void activeDirective(TokenKind word);
+    void textLine(std::string_view blanks, Token first);
+    void restOfTextLine();
+    void writeToken(const Token& token);
+    void endSkippedLine();
+
+    RunOptions options_;
+    OutputWriter output_;
+    ScannerStack sources_;
+    Diagnostics diagnostics_;
+    MacroTable macros_;
+    TextLexer lexer_;
+    MacroExpander expander_;
+    Conditionals conditionals_;
+    Definitions definitions_;
+    Inclusion inclusion_;
+    LineControl lineControl_;
+    TextReader textReader_;
+};
+
+}  // namespace umpre
+
+#endif

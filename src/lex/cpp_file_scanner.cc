@@ -1,0 +1,55 @@
+// SPDX-License-Identifier: MIT
+#include "lex/cpp_file_scanner.h"
+
+#include <unistd.h>
+
+namespace umpre {
+
+CppFileScanner::CppFileScanner(CommentSink& commentSink, const RunOptions& options)
+    : input_(options.windowSize), lexer_(commentSink, options) {}
+
+bool CppFileScanner::open(const std::string& fileName) {
+    if (fileName.empty()) {
+        fileName_ = "stdin";
+        input_.openBorrowed(STDIN_FILENO);
+    } else if (input_.openFile(fileName)) {
+        fileName_ = fileName;
+    } else {
+        return false;
+    }
+    start();
+    return true;
+}
+
+void CppFileScanner::openText(const std::string& fileName, std::string_view text) {
+    fileName_ = fileName;
+    input_.openText(text);
+    start();
+}
+
+void CppFileScanner::close() {
+    input_.close();
+}
+
+void CppFileScanner::start() {
+    lexer_.read(input_);
+    lastWasNewline_ = true;
+    restart();
+}
+
+void CppFileScanner::advance(std::size_t bytes, std::size_t lines, bool endsWithLineEnd) {
+    lexer_.advance(bytes, lines);
+    lastWasNewline_ = endsWithLineEnd;
+}
+
+Token CppFileScanner::scan() {
+    const Token token = lexer_.lex();
+    if (token.kind == TokenKind::END_OF_INPUT && !lastWasNewline_) {
+        lastWasNewline_ = true;
+        return {TokenKind::NEWLINE, {}};
+    }
+    lastWasNewline_ = token.kind == TokenKind::NEWLINE || token.kind == TokenKind::END_OF_INPUT;
+    return token;
+}
+
+}  // namespace umpre

@@ -1,0 +1,66 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_LEX_CPP_FILE_SCANNER_H
+#define UMPRE_LEX_CPP_FILE_SCANNER_H
+
+#include <string>
+#include <string_view>
+
+#include "lex/cpp_lexer.h"
+#include "lex/cpp_scanner.h"
+#include "lex/input_buffer.h"
+#include "lex/source_position.h"
+
+namespace umpre {
+
+/// The tokens of a file. If its last line has no line end, a NEWLINE with an empty text closes it.
+class CppFileScanner final : public CppScanner {
+public:
+    explicit CppFileScanner(CommentSink& commentSink, const RunOptions& options = {});
+
+    /// Opens a file, or standard input, called "stdin", if the name is empty. Returns false if it
+    /// cannot be opened; the scanner must then not be read.
+    [[nodiscard]] bool open(const std::string& fileName);
+    /// Reads a text as if it were the file of that name.
+    void openText(const std::string& fileName, std::string_view text);
+    /// Closes the file; the scanner can open another one.
+    void close();
+
+    /// The name in messages and line markers.
+    [[nodiscard]] const std::string& fileName() const noexcept { return fileName_; }
+
+    void setFileName(std::string_view name) { fileName_ = name; }
+
+    void setLine(std::int32_t line) noexcept { lexer_.setLine(line); }
+
+    [[nodiscard]] SourcePosition position() const noexcept { return {fileName_, lexer_.line()}; }
+
+    [[nodiscard]] NoExpandSet noExpandSet() const override { return {}; }
+
+    [[nodiscard]] bool isFile() const noexcept override { return true; }
+
+    /// For readers of bytes: the whole lines that lie ahead; empty at the end of the file, and
+    /// while a token is looked ahead at.
+    [[nodiscard]] std::string_view wholeLines() {
+        return hasPeek() ? std::string_view{} : lexer_.wholeLines();
+    }
+
+    /// Returns the size of the literal that begins at this place of `wholeLines()`, or 0.
+    [[nodiscard]] std::size_t literalSize(const char* quote) { return lexer_.literalSize(quote); }
+
+    /// Passes over bytes of `wholeLines()`, up to the beginning of a token, `lines` line ends among
+    /// them.
+    void advance(std::size_t bytes, std::size_t lines, bool endsWithLineEnd);
+
+private:
+    [[nodiscard]] Token scan() override;
+    void start();
+
+    InputBuffer input_;
+    CppLexer lexer_;
+    std::string fileName_;
+    bool lastWasNewline_ = true;
+};
+
+}  // namespace umpre
+
+#endif

@@ -1,0 +1,94 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_LEX_NO_EXPAND_SET_H
+#define UMPRE_LEX_NO_EXPAND_SET_H
+
+#include <bit>
+#include <cstddef>
+#include <cstdint>
+#include <deque>
+#include <string>
+#include <unordered_map>
+#include <vector>
+
+namespace umpre {
+
+/// A macro's name. There is one such object for each spelling, so its address says which name it
+/// is.
+struct Name {
+    std::string text;
+    mutable bool isMarked = false;  ///< by NoExpandSets, which looks into large sets that way
+};
+
+/// An immutable set of macro names, a value as small as a pointer. Sets share their nodes: a set is
+/// another set and one name more.
+class NoExpandSet {
+public:
+    /// The empty set.
+    NoExpandSet() = default;
+
+    friend bool operator==(const NoExpandSet&, const NoExpandSet&) = default;
+
+private:
+    friend class NoExpandSets;
+
+    struct Node {
+        const Node* rest;    // null: nothing but the name
+        const Name* name;    // the name that this node adds
+        std::uint64_t mask;  // one bit for each name of the set; names may share a bit
+        std::size_t size;    // of the set
+    };
+
+    explicit NoExpandSet(const Node* node) noexcept : node_(node) {}
+
+    [[nodiscard]] static std::uint64_t maskOf(const Name& name) noexcept {
+        // The low bits of an address are alike for all objects, and its high bits too.
+        const auto address = std::bit_cast<std::uintptr_t>(&name);
+        return std::uint64_t{1} << ((address >> 4U ^ address >> 10U) & 63U);
+    }
+
+    const Node* node_ = nullptr;
+};
+
+/// Makes and owns the sets of a run. Small sets made by adding the same names in the same order are
+/// equal.
+class NoExpandSets {
+public:
+    /// Tells whether the set holds the name.
+    [[nodiscard]] bool contains(NoExpandSet set, const Name& name) {
+        const NoExpandSet::Node* const node = set.node_;
+        return node != nullptr && (node->mask & NoExpandSet::maskOf(name)) != 0
+               && holds(*node, name);
+    }
+
+    /// Returns `set` and `name`.
+    [[nodiscard]] NoExpandSet with(NoExpandSet set, const Name& name);
+    /// Returns the names of both.
+    [[nodiscard]] NoExpandSet united(NoExpandSet set, NoExpandSet other);
+
+private:
+    struct Key {
+        const void* first;
+        const void* second;
+        friend bool operator==(const Key&, const Key&) = default;
+    };
+
+    struct KeyHash {
+        [[nodiscard]] std::size_t operator()(const Key& key) const noexcept;
+    };
+
+    using Node = NoExpandSet::Node;
+
+    [[nodiscard]] bool holds(const Node& set, const Name& name);
+    void mark(const Node& set);
+    [[nodiscard]] const Node* add(const Node* rest, const Name& name);
+
+    std::deque<Node> nodes_;
+    std::unordered_map<Key, const Node*, KeyHash> extended_;  // (set, name) to set
+    std::unordered_map<Key, NoExpandSet, KeyHash> unions_;    // (set, set) to set
+    const Node* marked_ = nullptr;                            // the set whose names are marked
+    std::vector<const Node*> path_;
+};
+
+}  // namespace umpre
+
+#endif

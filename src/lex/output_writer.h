@@ -1,0 +1,85 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_LEX_OUTPUT_WRITER_H
+#define UMPRE_LEX_OUTPUT_WRITER_H
+
+#include <cstddef>
+#include <cstdint>
+#include <string_view>
+#include <vector>
+
+#include "lex/byte_sink.h"
+#include "lex/source_position.h"
+
+namespace umpre {
+
+/// The only way out for text: collects it in blocks, counts the line feeds of its lines, and writes
+/// the markers that keep the output in step with the input. After the first failure nothing more
+/// is written.
+class OutputWriter {
+public:
+    OutputWriter();
+
+    /// Sends what is written from now on to a borrowed sink.
+    void redirect(ByteSink& sink);
+
+    /// Writes text as it is. Line feeds in it are not counted.
+    void write(std::string_view text) {
+        if (text.size() > kBlockSize - used_) {
+            writeLarge(text);
+            return;
+        }
+        used_ += text.copy(block_.data() + used_, text.size());
+    }
+
+    /// Writes the line feed that stands for a line end of the input, and counts it.
+    void endLine() { endLines(1); }
+
+    /// Writes `count` counted line feeds.
+    void endLines(std::size_t count) {
+        writeLineFeeds(count);
+        countLines(count);
+    }
+
+    /// Counts line feeds that were part of a text written.
+    void countLines(std::size_t count) { outputLine_ = addLines(outputLine_, count); }
+
+    /// Writes line feeds that are not counted: the line ends inside a comment.
+    void writeLineFeeds(std::size_t count);
+
+    /// Tells whether the next output line stands for the input line at `position`.
+    [[nodiscard]] bool isAt(const SourcePosition& position) const noexcept {
+        return outputLine_ == position.line;
+    }
+
+    /// Writes a line marker if the output is not at the input's line.
+    void syncTo(const SourcePosition& position) {
+        if (!isAt(position)) {
+            writeLineMarker(position);
+        }
+    }
+
+    /// Writes `#line N "name"` with every backslash of the name doubled, and counts from there.
+    void writeLineMarker(const SourcePosition& position);
+
+    /// Hands everything written to the sink.
+    void flush();
+
+    /// Tells whether something could not be written.
+    [[nodiscard]] bool failed() const noexcept { return failed_; }
+
+private:
+    static constexpr std::size_t kBlockSize = std::size_t{64} * 1024;
+
+    void writeLarge(std::string_view text);
+    void handOver(std::string_view text);
+
+    std::vector<char> block_;
+    std::size_t used_ = 0;
+    ByteSink* sink_ = nullptr;
+    std::int32_t outputLine_ = 0;
+    bool failed_ = false;
+};
+
+}  // namespace umpre
+
+#endif

@@ -1,0 +1,184 @@
+// SPDX-License-Identifier: MIT
+//
+// Sources lie on one stack; the last is read. A macro's replacement goes on top of the file that
+// used the macro, an included file on top of its includer. With `f(1)` in the file and f's
+// replacement "g" pushed, the stack is
+//
+//     file  "g"          and after "g" is read:    file          with "(1)" still to come
+//
+// An operand that must not run on into what lies below is read alone: `floor_` is raised to its own
+// place, so that nothing below is popped into, and lowered again afterwards.
+#include "lex/scanner_stack.h"
+
+#include <cassert>
+#include <utility>
+
+namespace umpre {
+namespace {
+
+// Sources kept for use again; more of them are open at a time only in deep nesting.
+constexpr std::size_t kSpares = 64;
+
+template <typename Scanner>
+void keep(std::vector<std::unique_ptr<Scanner>>& spares, std::unique_ptr<Scanner> scanner) {
+    if (spares.size() < kSpares) {
+        spares.push_back(std::move(scanner));
+    }
+}
+
+}  // namespace
+
+ScannerStack::ScannerStack(FileEvents& events, OutputWriter& output, Reporter& reporter,
+                           const RunOptions& options)
+    : events_(events), output_(output), reporter_(reporter), options_(options) {}
+
+ScannerStack::~ScannerStack() = default;
+
+TokenKind ScannerStack::peekBelow() {
+    TokenKind kind = TokenKind::END_OF_INPUT;
+    while (kind == TokenKind::END_OF_INPUT && !atFloor()) {
+        pop();
+        kind = currentSource_->peek();
+    }
+    return kind;
+}
+
+Token ScannerStack::nextBelow() {
+    Token token;
+    while (token.kind == TokenKind::END_OF_INPUT && !atFloor()) {
+        pop();
+        token = currentSource_->next();
+    }
+    return token;
+}
+
+void ScannerStack::pop() {
+    const bool isFile = currentSource_->isFile();
+    if (isFile) {
+        events_.fileEnds();
+    }
+    dropCurrent();
+    if (isFile) {
+        events_.fileResumed();
+    }
+}
+
+void ScannerStack::dropCurrent() {
+    Source source = std::move(sources_.back());
+    sources_.pop_back();
+    assert(!sources_.empty());
+    const Source& below = sources_.back();
+    currentSource_ = below.file != nullptr ? static_cast<CppScanner*>(below.file.get())
+                                           : static_cast<CppScanner*>(below.list.get());
+    if (source.file != nullptr) {
+        files_.pop_back();
+        source.file->close();
+        keep(spareFiles_, std::move(source.file));
+    } else {
+        keep(spareLists_, std::move(source.list));
+    }
+}
+
+std::string ScannerStack::skipWhile(bool (*wanted)(TokenKind)) {
+    std::string skipped;
+    while (wanted(peek())) {
+        skipped.append(next().text);
+    }
+    return skipped;
+}
+
+bool ScannerStack::skipBlanksAndNewlines(std::string& skipped) {
+    skipped.clear();
+    if (!isBlankOrNewline(peek())) {
+        return false;
+    }
+    // The NEWLINE that a file supplies at its end has no text, but it counts.
+    skipped = skipWhile(isBlankOrNewline);
+    return true;
+}
+
+void ScannerStack::skipToEndOfLine() {
+    while (!endsLine(next().kind)) {
+    }
+}
+
+bool ScannerStack::pushFile(const std::string& fileName, std::string_view messageName) {
+    std::unique_ptr<CppFileScanner> file;
+    if (spareFiles_.empty()) {
+        file = std::make_unique<CppFileScanner>(commentSink(), options_);
+    } else {
+        file = std::move(spareFiles_.back());
+        spareFiles_.pop_back();
+    }
+    if (!file->open(fileName)) {
+        spareFiles_.push_back(std::move(file));
+        return false;
+    }
+    if (!messageName.empty()) {
+        file->setFileName(messageName);
+    }
+    enter(std::move(file));
+    return true;
+}
+
+void ScannerStack::pushFileText(const std::string& fileName, std::string_view text) {
+    auto file = std::make_unique<CppFileScanner>(commentSink(), options_);
+    file->openText(fileName, text);
+    enter(std::move(file));
+}
+
+void ScannerStack::enter(std::unique_ptr<CppFileScanner> file) {
+    files_.push_back(file.get());
+    currentSource_ = file.get();
+    sources_.push_back({std::move(file), nullptr});
+    events_.fileEntered();
+}
+
+CppTokenScanner& ScannerStack::pushTokens() {
+    // A list that is read to its end has nothing more to say; without this, a macro that ends in
+    // the name of another would leave a source behind for each.
+    while (!atFloor() && sources_.back().list != nullptr && sources_.back().list->isExhausted()) {
+        dropCurrent();
+    }
+    if (spareLists_.empty()) {
+        spareLists_.push_back(std::make_unique<CppTokenScanner>(commentSink()));
+    }
+    sources_.push_back({nullptr, std::move(spareLists_.back())});
+    spareLists_.pop_back();
+    CppTokenScanner& list = *sources_.back().list;
+    currentSource_ = &list;
+    return list;
+}
+
+void ScannerStack::pushPieces(Pieces& pieces) {
+    pushTokens().read(pieces);
+}
+
+void ScannerStack::pushShared(std::shared_ptr<const LexedText> text, NoExpandSet noExpand) {
+    pushTokens().read(std::move(text), noExpand);
+}
+
+void ScannerStack::isolate(Pieces& pieces) {
+    savedFloors_.push_back(floor_);
+    pushPieces(pieces);
+    floor_ = sources_.size();
+}
+
+void ScannerStack::endIsolation() {
+    assert(atFloor());
+    floor_ = savedFloors_.back();
+    savedFloors_.pop_back();
+    dropCurrent();
+}
+
+void ScannerStack::commentLineEnds(std::size_t count) {
+    ++commentEffects_;
+    output_.writeLineFeeds(count);
+}
+
+void ScannerStack::unterminatedComment(std::int32_t line) {
+    ++commentEffects_;
+    reporter_.noteUnterminatedComment(line);
+}
+
+}  // namespace umpre

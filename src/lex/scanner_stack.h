@@ -1,0 +1,144 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_LEX_SCANNER_STACK_H
+#define UMPRE_LEX_SCANNER_STACK_H
+
+#include <cstddef>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "lex/comment_sink.h"
+#include "lex/cpp_file_scanner.h"
+#include "lex/cpp_scanner.h"
+#include "lex/cpp_token_scanner.h"
+#include "lex/output_writer.h"
+#include "lex/pieces.h"
+#include "lex/reporter.h"
+#include "lex/run_options.h"
+#include "lex/source_position.h"
+#include "lex/token.h"
+
+namespace umpre {
+
+/// What happens to files on the stack. The file that ends is still the current one when it ends.
+class FileEvents {
+public:
+    virtual ~FileEvents() = default;
+    virtual void fileEntered() = 0;
+    virtual void fileEnds() = 0;
+    virtual void fileResumed() = 0;
+};
+
+/// What is read now, and what waits below it. Every consumer reads through `peek` and `next`, which
+/// drop an exhausted source and go on in the one below.
+class ScannerStack final : private CommentSink {
+public:
+    /// The references must outlive the stack; none is used before the first source is pushed.
+    ScannerStack(FileEvents& events, OutputWriter& output, Reporter& reporter,
+                 const RunOptions& options);
+    ScannerStack(const ScannerStack&) = delete;
+    ScannerStack& operator=(const ScannerStack&) = delete;
+    ~ScannerStack() override;
+
+    /// Returns the kind of the next token; END_OF_INPUT when all is read, or the isolated source
+    /// is.
+    [[nodiscard]] TokenKind peek() {
+        const TokenKind kind = currentSource_->peek();
+        return kind != TokenKind::END_OF_INPUT || atFloor() ? kind : peekBelow();
+    }
+
+    /// Consumes the next token. Its text is valid until the next `peek` or `next`.
+    Token next() {
+        const Token token = currentSource_->next();
+        return token.kind != TokenKind::END_OF_INPUT || atFloor() ? token : nextBelow();
+    }
+
+    /// Returns the names that must not be expanded in the token last read or peeked.
+    [[nodiscard]] NoExpandSet noExpandSet() const { return currentSource_->noExpandSet(); }
+
+    /// Consumes blanks and returns their texts, joined.
+    std::string skipBlanks() { return skipWhile(isBlank); }
+
+    /// Consumes blanks and line ends and returns their texts, joined. Tells whether there were any.
+    bool skipBlanksAndNewlines(std::string& skipped);
+    /// Consumes tokens up to and including a NEWLINE, at least one.
+    void skipToEndOfLine();
+
+    /// Opens a file, or standard input if the name is empty, and reads it from now on. Returns
+    /// false, with nothing changed, if it cannot be opened. `messageName`, if not empty, replaces
+    /// the name in messages and markers.
+    [[nodiscard]] bool pushFile(const std::string& fileName, std::string_view messageName = {});
+    /// Reads a text as if it were a file.
+    void pushFileText(const std::string& fileName, std::string_view text);
+    /// Reads pieces, taking them over; what is left of `pieces` is memory to use again.
+    void pushPieces(Pieces& pieces);
+    /// Reads a text that stays shared with its owner, as one piece.
+    void pushShared(std::shared_ptr<const LexedText> text, NoExpandSet noExpand);
+
+    /// Reads pieces on their own: until `endIsolation`, reading ends where they end.
+    void isolate(Pieces& pieces);
+    void endIsolation();
+
+    /// Returns the file that is being read, also while a macro's replacement is read.
+    [[nodiscard]] CppFileScanner& currentFile() noexcept { return *files_.back(); }
+
+    [[nodiscard]] bool hasFile() const noexcept { return !files_.empty(); }
+
+    [[nodiscard]] SourcePosition position() const { return files_.back()->position(); }
+
+    /// Returns the file if the next token comes straight from it, otherwise null.
+    [[nodiscard]] CppFileScanner* fileReadNow() noexcept {
+        return currentSource_ == files_.back() ? files_.back() : nullptr;
+    }
+
+    /// Does what reading a token of a text does beside yielding it.
+    void carryOutEffects(const LexedText& text, std::size_t index) {
+        text.carryOutEffects(index, *this);
+    }
+
+    /// Returns how many comments met so far had an effect beside their blank.
+    [[nodiscard]] std::size_t commentEffects() const noexcept { return commentEffects_; }
+
+private:
+    void commentLineEnds(std::size_t count) override;
+    void unterminatedComment(std::int32_t line) override;
+
+    [[nodiscard]] CommentSink& commentSink() noexcept { return *this; }
+
+    [[nodiscard]] bool atFloor() const noexcept { return sources_.size() == floor_; }
+
+    [[nodiscard]] TokenKind peekBelow();
+    [[nodiscard]] Token nextBelow();
+    [[nodiscard]] std::string skipWhile(bool (*wanted)(TokenKind));
+    void enter(std::unique_ptr<CppFileScanner> file);
+    [[nodiscard]] CppTokenScanner& pushTokens();
+    void pop();
+    void dropCurrent();
+
+    FileEvents& events_;
+    OutputWriter& output_;
+    Reporter& reporter_;
+    RunOptions options_;
+
+    // One of the two.
+    struct Source {
+        std::unique_ptr<CppFileScanner> file;
+        std::unique_ptr<CppTokenScanner> list;
+    };
+
+    CppScanner* currentSource_ = nullptr;
+    std::vector<Source> sources_;         // the current one is the last
+    std::vector<CppFileScanner*> files_;  // those of the sources that are files
+    // Reading stays at or above this many sources: the main file, or the source read on its own.
+    std::size_t floor_ = 1;
+    std::vector<std::size_t> savedFloors_;
+    std::vector<std::unique_ptr<CppTokenScanner>>
+        spareLists_;  // read to their ends, to be used again
+    std::vector<std::unique_ptr<CppFileScanner>> spareFiles_;
+    std::size_t commentEffects_ = 0;
+};
+
+}  // namespace umpre
+
+#endif

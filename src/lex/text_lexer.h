@@ -1,0 +1,34 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_LEX_TEXT_LEXER_H
+#define UMPRE_LEX_TEXT_LEXER_H
+
+#include <string>
+#include <string_view>
+
+#include "lex/comment_sink.h"
+#include "lex/cpp_lexer.h"
+#include "lex/lexed_text.h"
+
+namespace umpre {
+
+/// Lexes texts: macro bodies, arguments, directive operands. One scanner and one piece of memory
+/// serve all of them.
+class TextLexer final : private CommentSink {
+public:
+    explicit TextLexer(const RunOptions& options = {}) : lexer_(*this, options) {}
+
+    /// Adds the tokens of `text` to `to`. What comments in it do is recorded there, not done.
+    void append(LexedText& to, std::string_view text);
+
+private:
+    void commentLineEnds(std::size_t count) override;
+    void unterminatedComment(std::int32_t line) override;
+
+    std::string memory_;
+    CppLexer lexer_;
+    LexedText* to_ = nullptr;
+};
+
+}  // namespace umpre
+
+#endif

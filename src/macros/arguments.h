@@ -1,0 +1,51 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_MACROS_ARGUMENTS_H
+#define UMPRE_MACROS_ARGUMENTS_H
+
+#include <cstddef>
+#include <string>
+#include <vector>
+
+#include "lex/no_expand_set.h"
+#include "lex/pieces.h"
+#include "lex/reporter.h"
+#include "lex/scanner_stack.h"
+
+namespace umpre {
+
+/// One argument of an invocation.
+struct Argument {
+    /// As written, with one space for each run of blanks and line ends, and none at its ends.
+    std::string text;
+    /// The names not to expand where the argument ended.
+    NoExpandSet noExpand;
+    /// The expansion, while it is known.
+    Pieces expansion;
+    enum class Expansion { Unknown, ForOneUse, Known } state = Expansion::Unknown;
+};
+
+/// The arguments of one invocation, in the order written. What `clear` leaves is used again.
+class ArgumentList {
+public:
+    void clear() noexcept { size_ = 0; }
+
+    /// Adds an empty argument.
+    Argument& add();
+
+    [[nodiscard]] std::size_t size() const noexcept { return size_; }
+
+    [[nodiscard]] Argument& operator[](std::size_t index) noexcept { return arguments_[index]; }
+
+private:
+    std::vector<Argument> arguments_;
+    std::size_t size_ = 0;
+};
+
+/// Reads an invocation from its "(", which is the next token, up to its ")" into `arguments`.
+/// Returns false after reporting an error; what was read then is lost, the rest stays to be read.
+[[nodiscard]] bool collectArguments(ScannerStack& sources, Reporter& reporter,
+                                    std::size_t parameterCount, ArgumentList& arguments);
+
+}  // namespace umpre
+
+#endif

@@ -1,0 +1,205 @@
+// SPDX-License-Identifier: MIT
+//
+// A body is read once, token by token. An operand, that is a token, a parameter or "#" with its
+// parameter, is held back until the next token shows whether a "##" follows: then its text is
+// joined with the next operand's, otherwise it stands alone. For F(x, y) with the body "[x] y ## _
+// # x":
+//
+//     Tokens "["   Argument x   Tokens "] "   Joined {y, "_"}   Tokens " "   Joined {"x"}
+//
+// where the last one is the string literal of x.
+#include "macros/macro_body.h"
+
+#include <optional>
+#include <string_view>
+#include <unordered_map>
+#include <utility>
+
+namespace umpre {
+namespace {
+
+using enum TokenKind;
+
+class BodyBuilder {
+public:
+    BodyBuilder(const Macro& macro, const LexedText& text, MacroBody& body)
+        : text_(text), body_(body) {
+        for (std::size_t index = 0; index < macro.parameters.size(); ++index) {
+            parameters_[macro.parameters[index]] = index;  // of two with one name, the last counts
+        }
+    }
+
+    void build() {
+        while (at_ < text_.size() && !failed_) {
+            readToken();
+        }
+        if (failed_) {
+            return;
+        }
+        if (pasting_) {
+            fail(BodyStep::Kind::PasteLast);
+        } else {
+            writeHeld();
+        }
+    }
+
+private:
+    // The last operand read. Alone, its only operand may be a parameter to be expanded.
+    struct Held {
+        std::size_t firstOperand;
+        bool isJoined;  // by "##", or a string literal
+    };
+
+    void readToken() {
+        noteEffects();
+        const TokenKind kind = text_.kind(at_);
+        if (isBlankOrNewline(kind)) {
+            blank_ = true;
+            ++at_;
+        } else if (kind == PASTE) {
+            readPaste();
+        } else {
+            readOperand(kind);
+        }
+    }
+
+    void readPaste() {
+        if (isFirst_) {
+            fail(BodyStep::Kind::PasteFirst);
+            return;
+        }
+        pasting_ = true;
+        blank_ = false;
+        ++at_;
+    }
+
+    void readOperand(TokenKind kind) {
+        if (!pasting_) {
+            writeHeld();
+            if (blank_ && !isFirst_) {
+                body_.tokens.append(WHITESPACE, " ");
+                writeLastToken();
+            }
+        }
+        const std::size_t firstOperand = body_.operands.size();
+        const std::optional<BodyOperand> operand = operandAt(kind);
+        if (!operand) {
+            fail(BodyStep::Kind::Misplaced);
+            return;
+        }
+        body_.operands.push_back(*operand);
+        if (pasting_) {
+            held_->isJoined = true;
+        } else {
+            held_ = {firstOperand, operand->kind == BodyOperand::Kind::Stringized};
+        }
+        pasting_ = false;
+        isFirst_ = false;
+        blank_ = false;
+        ++at_;
+    }
+
+    // Leaves `at_` on the operand's last token. Returns nothing for a "#" without a parameter.
+    std::optional<BodyOperand> operandAt(TokenKind kind) {
+        if (kind == HASH) {
+            do {
+                ++at_;
+                if (at_ == text_.size()) {
+                    return std::nullopt;
+                }
+                noteEffects();
+            } while (isBlankOrNewline(text_.kind(at_)));
+            const std::optional<std::size_t> parameter = parameterAt(at_);
+            if (!parameter) {
+                return std::nullopt;
+            }
+            return BodyOperand{BodyOperand::Kind::Stringized, *parameter};
+        }
+        if (const std::optional<std::size_t> parameter = parameterAt(at_)) {
+            return BodyOperand{BodyOperand::Kind::RawArgument, *parameter};
+        }
+        body_.tokens.append(kind, text_.text(at_));
+        return BodyOperand{BodyOperand::Kind::Token, body_.tokens.size() - 1};
+    }
+
+    [[nodiscard]] std::optional<std::size_t> parameterAt(std::size_t index) const {
+        const auto it = parameters_.find(text_.text(index));
+        if (!isName(text_.kind(index)) || it == parameters_.end()) {
+            return std::nullopt;
+        }
+        return it->second;
+    }
+
+    void writeHeld() {
+        if (!held_) {
+            return;
+        }
+        const BodyOperand& operand = body_.operands[held_->firstOperand];
+        if (held_->isJoined) {
+            body_.steps.push_back(
+                {BodyStep::Kind::Joined, held_->firstOperand, body_.operands.size()});
+        } else if (operand.kind == BodyOperand::Kind::Token) {
+            writeLastToken();
+        } else {
+            body_.steps.push_back({BodyStep::Kind::Argument, operand.index, 0});
+        }
+        held_.reset();
+    }
+
+    // Puts the token last added to the body's own into the replacement.
+    void writeLastToken() {
+        const std::size_t last = body_.tokens.size();
+        if (!body_.steps.empty() && body_.steps.back().kind == BodyStep::Kind::Tokens
+            && body_.steps.back().last == last - 1) {
+            body_.steps.back().last = last;
+        } else {
+            body_.steps.push_back({BodyStep::Kind::Tokens, last - 1, last});
+        }
+    }
+
+    // The effects of a comment happen where the comment is read, not where its blank is written.
+    void noteEffects() {
+        if (text_.hasEffects() && effectsNoted_ <= at_) {
+            body_.steps.push_back({BodyStep::Kind::Effects, at_, 0});
+            effectsNoted_ = at_ + 1;
+        }
+    }
+
+    void fail(BodyStep::Kind kind) {
+        body_.steps.push_back({kind, 0, 0});
+        failed_ = true;
+    }
+
+    std::unordered_map<std::string_view, std::size_t> parameters_;  // to their numbers
+    const LexedText& text_;
+    MacroBody& body_;
+    std::size_t at_ = 0;
+    std::size_t effectsNoted_ = 0;
+    std::optional<Held> held_;
+    bool pasting_ = false;  // a "##" waits for its right operand; the left one is held
+    bool blank_ = false;    // blanks were read since the last token
+    bool isFirst_ = true;
+    bool failed_ = false;
+};
+
+}  // namespace
+
+const std::shared_ptr<const MacroBody>& bodyOf(const Macro& macro, TextLexer& lexer) {
+    if (macro.body == nullptr) {
+        auto body = std::make_shared<MacroBody>();
+        if (macro.functionLike) {
+            LexedText source;
+            lexer.append(source, macro.text);
+            BodyBuilder(macro, source, *body).build();
+            if (source.hasEffects()) {
+                body->source = std::move(source);
+            }
+        } else {
+            lexer.append(body->tokens, macro.text);
+        }
+        macro.body = std::move(body);
+    }
+    return macro.body;
+}
+
+}  // namespace umpre

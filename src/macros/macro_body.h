@@ -1,0 +1,57 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_MACROS_MACRO_BODY_H
+#define UMPRE_MACROS_MACRO_BODY_H
+
+#include <cstddef>
+#include <memory>
+#include <vector>
+
+#include "lex/lexed_text.h"
+#include "lex/text_lexer.h"
+#include "macros/macro.h"
+
+namespace umpre {
+
+/// One step of building a replacement.
+struct BodyStep {
+    enum class Kind {
+        Tokens,      ///< tokens `first` to `last` of the body, as they are
+        Effects,     ///< what reading token `first` of the source does
+        Argument,    ///< the expanded argument number `first`
+        Joined,      ///< the operands `first` to `last`, joined into one text
+        Misplaced,   ///< error: "#" without a parameter; ends the replacement
+        PasteFirst,  ///< error: "##" begins the body; ends the replacement
+        PasteLast,   ///< error: "##" ends the body; ends the replacement
+    };
+    Kind kind = Kind::Tokens;
+    std::size_t first = 0;
+    std::size_t last = 0;  // not included
+};
+
+/// One text of those that a step joins.
+struct BodyOperand {
+    enum class Kind {
+        Token,        ///< token `index` of the body
+        RawArgument,  ///< the text of argument `index`, unexpanded
+        Stringized,   ///< the string literal of argument `index`
+    };
+    Kind kind = Kind::Token;
+    std::size_t index = 0;
+};
+
+/// A replacement text made ready for use: lexed, and, for a function-like macro, with what `#`,
+/// `##` and the parameters ask for worked out.
+struct MacroBody {
+    LexedText tokens;
+    // For function-like macros only:
+    LexedText source;  // the text as lexed, if reading it has effects
+    std::vector<BodyStep> steps;
+    std::vector<BodyOperand> operands;
+};
+
+/// Returns the body of a macro, made at the first call.
+[[nodiscard]] const std::shared_ptr<const MacroBody>& bodyOf(const Macro& macro, TextLexer& lexer);
+
+}  // namespace umpre
+
+#endif

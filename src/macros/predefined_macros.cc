@@ -1,0 +1,61 @@
+// SPDX-License-Identifier: MIT
+#include "macros/predefined_macros.h"
+
+#include <array>
+#include <ctime>
+#include <memory>
+#include <string>
+
+namespace umpre {
+namespace {
+
+// Of `__FILE__` as of `__LINE__`; most names are told from them by it.
+constexpr std::size_t kRefreshedLength = 8;
+
+[[nodiscard]] std::string twoDigits(int number, char filling) {
+    std::string text = std::to_string(number);
+    if (text.size() < 2) {
+        text.insert(0, 1, filling);
+    }
+    return text;
+}
+
+}  // namespace
+
+void definePredefinedMacros(MacroTable& macros) {
+    static constexpr std::array<const char*, 12> kMonths{"Jan", "Feb", "Mar", "Apr", "May", "Jun",
+                                                         "Jul", "Aug", "Sep", "Oct", "Nov", "Dec"};
+    macros.defineMacro("__FILE__", "");
+    macros.defineMacro("__LINE__", "");
+    const std::time_t now = std::time(nullptr);
+    std::tm local{};
+    ::localtime_r(&now, &local);
+    const std::string date = std::string(kMonths.at(static_cast<std::size_t>(local.tm_mon))) + " "
+                             + twoDigits(local.tm_mday, ' ') + " "
+                             + std::to_string(1900 + local.tm_year);
+    const std::string time = twoDigits(local.tm_hour, '0') + ":" + twoDigits(local.tm_min, '0')
+                             + ":" + twoDigits(local.tm_sec, '0');
+    macros.defineMacro("__DATE__", date);
+    macros.defineMacro("__TIME__", time);
+}
+
+void refreshPredefined(MacroName& name, const SourcePosition& position) {
+    if (name.text.size() != kRefreshedLength) {
+        return;
+    }
+    std::string text;
+    if (name.text == "__FILE__") {
+        text.append("\"").append(position.fileName).append("\"");
+    } else if (name.text == "__LINE__") {
+        text = std::to_string(position.line);
+    } else {
+        return;
+    }
+    // The definition may be one of the source's own; only its text is replaced.
+    if (text != name.macro->text) {
+        name.macro = std::make_shared<const Macro>(std::move(text), name.macro->parameters,
+                                                   name.macro->functionLike);
+    }
+}
+
+}  // namespace umpre

@@ -1,0 +1,20 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_MACROS_PREDEFINED_MACROS_H
+#define UMPRE_MACROS_PREDEFINED_MACROS_H
+
+#include "lex/source_position.h"
+#include "macros/macro.h"
+#include "macros/macro_table.h"
+
+namespace umpre {
+
+/// Enters `__FILE__`, `__LINE__`, `__DATE__` and `__TIME__`, the last two with the local time of
+/// now.
+void definePredefinedMacros(MacroTable& macros);
+
+/// Gives `__FILE__` and `__LINE__` their current text; leaves every other macro alone.
+void refreshPredefined(MacroName& name, const SourcePosition& position);
+
+}  // namespace umpre
+
+#endif

@@ -1,0 +1,10 @@
+/* SPDX-License-Identifier: MIT */
+#ifndef STUB_ENDIAN_H
+#define STUB_ENDIAN_H
+#define LITTLE_ENDIAN 1234
+#define BIG_ENDIAN 4321
+#define BYTE_ORDER LITTLE_ENDIAN
+#define __LITTLE_ENDIAN LITTLE_ENDIAN
+#define __BIG_ENDIAN BIG_ENDIAN
+#define __BYTE_ORDER BYTE_ORDER
+#endif

@@ -1,0 +1,372 @@
+// SPDX-License-Identifier: MIT
+//
+// A run may copy and skip text as bytes or read all of it as tokens, and it may hold much or little
+// of its input at a time. Whichever road it takes, the same must come out.
+#include <array>
+#include <cstddef>
+#include <ostream>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+#include "driver/preprocessor.h"
+#include "support/recording_sink.h"
+#include "support/temporary_directory.h"
+
+namespace umpre {
+namespace {
+
+using std::string_literals::operator""s;
+
+constexpr auto kWindowSizes = std::to_array<std::size_t>({1, 2, 3, 7, 64, 64 * 1024});
+
+constexpr std::string_view kMacros =
+    "#define N 3\n"
+    "#define EMPTY\n"
+    "#define F(x) [x]\n"
+    "#define G() g\n"
+    "#define S(x) #x\n"
+    "#define J(a, b) a##b\n"
+    "#define H(a, b) a + b\n";
+
+// What a run gives.
+struct Outcome {
+    std::string output;
+    std::string errors;
+    RunResult result;
+
+    friend bool operator==(const Outcome&, const Outcome&) = default;
+
+    friend void PrintTo(const Outcome& outcome, std::ostream* out) {
+        *out << "output " << ::testing::PrintToString(outcome.output) << ", errors "
+             << ::testing::PrintToString(outcome.errors) << ", result "
+             << static_cast<int>(outcome.result);
+    }
+};
+
+struct Run {
+    explicit Run(const RunOptions& options) : preprocessor(errors, options) {
+        preprocessor.setOutput(output);
+    }
+
+    [[nodiscard]] Outcome outcome() {
+        const RunResult result = preprocessor.run();
+        return {output.bytes(), errors.bytes(), result};
+    }
+
+    testing::RecordingSink output;
+    testing::RecordingSink errors;
+    Preprocessor preprocessor;
+};
+
+// The plain road with all of the text at hand is the one that the others are held against.
+[[nodiscard]] Outcome plainOutcome(std::string_view text) {
+    Run run({.plainRoad = true});
+    run.preprocessor.openText("main", text);
+    return run.outcome();
+}
+
+[[nodiscard]] Outcome fileOutcome(const std::string& fileName, const RunOptions& options) {
+    Run run(options);
+    if (!run.preprocessor.openSource(fileName, "main")) {
+        return {"", "not opened", RunResult::Errors};
+    }
+    return run.outcome();
+}
+
+[[nodiscard]] Outcome textOutcome(std::string_view text, const RunOptions& options) {
+    Run run(options);
+    run.preprocessor.openText("main", text);
+    return run.outcome();
+}
+
+void expectSameOnAllRoads(std::string_view text) {
+    const testing::TemporaryDirectory directory;
+    const std::string fileName = directory.write("main", text);
+    const Outcome expected = plainOutcome(text);
+    for (const bool plainRoad : {true, false}) {
+        for (const std::size_t windowSize : kWindowSizes) {
+            const RunOptions options{plainRoad, windowSize};
+            EXPECT_EQ(fileOutcome(fileName, options), expected)
+                << ::testing::PrintToString(text) << ", plain road " << plainRoad << ", window "
+                << windowSize;
+            EXPECT_EQ(textOutcome(text, options), expected)
+                << ::testing::PrintToString(text) << " as a text, plain road " << plainRoad
+                << ", window " << windowSize;
+        }
+    }
+}
+
+// Each text as it is, after the macros, in a branch that is skipped, and without its last byte.
+void expectSameOnAllRoads(const std::vector<std::string>& texts) {
+    for (const std::string& text : texts) {
+        const std::string defined = std::string(kMacros).append(text);
+        expectSameOnAllRoads(text);
+        expectSameOnAllRoads(defined);
+        expectSameOnAllRoads(std::string("#if 0\n").append(text).append("\n#else\nN\n#endif\nend"));
+        expectSameOnAllRoads(std::string_view(defined).substr(0, defined.size() - 1));
+    }
+}
+
+TEST(Roads, WriteWhatIsExpected) {
+    const Outcome outcome = textOutcome("#define N 3\nN \"N\" /* N */ n\n", {});
+    EXPECT_EQ(outcome.output, "#line 1 \"main\"\n#line 2 \"main\"\n3 \"N\"   n\n");
+    EXPECT_EQ(outcome.errors, "");
+    EXPECT_EQ(outcome.result, RunResult::Clean);
+    expectSameOnAllRoads("#define N 3\nN \"N\" /* N */ n\n");
+}
+
+TEST(Roads, AgreeOnNothing) {
+    expectSameOnAllRoads("");
+    expectSameOnAllRoads("\n");
+    expectSameOnAllRoads(" ");
+    expectSameOnAllRoads("\n\n\n \n\t\nx");
+}
+
+TEST(Roads, AgreeOnQuotes) {
+    expectSameOnAllRoads({
+        "a \"N\" 'N' N\n",
+        "a \" N\nN\n",
+        "a ' N\nN\n",
+        "it's N\nit's N isn't N\n",
+        "\"N 'N\" N' N\n",
+        "'N \"N' N\" N\n",
+        "\"\" '' N\n",
+        "\"N\\\"N\\\"\" N\n",
+        "\"N\\\\\" N \"\\\\\\\" N\n N\" N\n",
+        "\\\" N \\\"N\\\" N\n",
+        "\\\"\\\"\\\"N\\\\\"N\"\n",
+        "'\\'' N '\\\\' N '\\\n",
+        "\"N /* N\" N */ N\n",
+        "\"N // N\" N\n",
+        "L\"N\" u8\"N\" N\"N\" N'N'\n",
+        "\"N\\\nN\" N\n",
+        "'N\\\nN' N\n",
+        "\"N\n\"N\n\"N\"N\n",
+        "\"N",
+        "N\"",
+        "\"\\",
+    });
+}
+
+TEST(Roads, AgreeOnCarriageReturns) {
+    expectSameOnAllRoads({
+        "N\r\nN\r\n",
+        "N\rN\rN",
+        "\"a\rN\" N\n",
+        "\"a\r\nN\" N\r\n",
+        "'\r' N\n",
+        "\r\r\n\n\rN",
+        "a \\\r\nN\r\n",
+        "a \\\rN\n",
+        "/* a\r\nb\rc */ N\r\n",
+        "// a\rN\n",
+        "// a\r\nN\r\n",
+        "#define M 1\r\nM\r\n#undef M\r\nM\r\n",
+        "\r#define M 1\r\nM\r\n",
+        "#if 1\r\nN\r\n#else\r\n\"N\r\n#endif\r\n",
+    });
+}
+
+TEST(Roads, AgreeOnContinuations) {
+    expectSameOnAllRoads({
+        "a \\\nN\\\n\\\n N\nN\n",
+        "\\\nN\n",
+        "\\\n#define M 1\nM\n",
+        "#def\\\nine M 1\nM\n",
+        "#define M 1 \\\n + \\\n2\nM\n",
+        "#\\\nN\n",
+        "a \\ \nN\n",
+        "a \\N\\\\\n\\\\\\\nN\n",
+        "// a \\\nN\nN\n",
+        "N\\\nN N\\",
+        "/\\\n* N */\n",
+    });
+}
+
+TEST(Roads, AgreeOnComments) {
+    expectSameOnAllRoads({
+        "a /* N */ N/**/N /***/ N /*/ N */\n",
+        "/* one\ntwo\n three */ N\nN\n",
+        "N /* one\n\n\n*/\n/* N */ #define M 1\nM\n",
+        "/* one\n*/ #define M 1\nM\n",
+        "#define M /* one\ntwo */ 1\nM N\n",
+        "N // N /* N\nN /* // */ N\n",
+        "N /* \" */ N /* ' */ N\n",
+        "// \" '\nN\n",
+        "N /* no end\nN\n",
+        "N\n#define M /* no end\nN\n",
+        "N /* **** * / \n ***/ N // **\n//\n/\nN / N\n",
+        "/*\n*/\n/*\n*/N/*\n*/N\n",
+        "/* no end *",
+        "N /",
+        "N /*",
+        "N //",
+    });
+}
+
+TEST(Roads, AgreeOnStrangeBytes) {
+    expectSameOnAllRoads({
+        "N\0N\0\nN\0"s,
+        "\0#define M 1\nM\n\0\0N"s,
+        "\"a\0N\" N '\0' N\n"s,
+        "/* \0 */ N // \0 N\nN\n"s,
+        "N \xE9N \xFF\xFEN\nN\xE9\n",
+        "\xE9 \"\xE9\" '\xE9' /* \xE9 */ N // \xE9\n",
+        "N\v\f\tN \v#define M 1\nM\n\f\n\v#N\n",
+        "@ ` $N $ N$ ~ ? : N\x7F\x01N\n",
+        "\x1AN\n",
+    });
+}
+
+TEST(Roads, AgreeOnNumbers) {
+    expectSameOnAllRoads({
+        "0x1g 1e5 08 10ULL 0N 1N 1.N .N .5N N.5\n",
+        "0xN 0x 0xFN 0x1FULL 0x1FULLN 1e 1eN 1e+ 1e+N 1e+5N 1.e-3fN\n",
+        "10L 10LL 10U 10UL 10LN 10uN 017 019 018N 1_N 1.2.3N ..N ...N\n",
+        "N1 N_1 1N1 _N N_ 0b1N 1'N'2 1\"N\"\n",
+        "#if 1N\n#elif 0x1g\n#elif 08\n#elif 10ULL\nN\n#endif\n",
+        "#define E1 5\n1E1 0xE1 .E1 1.E1 E1\n",
+    });
+}
+
+TEST(Roads, AgreeOnSkippedGroups) {
+    expectSameOnAllRoads({
+        "#if 0\n\"N\n'N\n#endif\nN\n",
+        "#if 0\nit's /* N\n#endif\n*/ N\n#endif\nN\n",
+        "#if 0\n\"/*\"\n#endif\nN\n",
+        "#if 0\n\"\\\"/*\"\n'\"' /* \" */\n#endif\nN\n",
+        "#if 0\n#\n# \n #N\n##\n# 1\n#define N 4\n#include \"no\"\n#error N\n#else\nN\n#endif\n",
+        "#if 0\n#if 1\nN\n#elif\n#else\nN\n#endif\nN\n#elif 1\nN\n#endif\n",
+        "#if 0\na \\\n#endif\n#endif\nN\n",
+        "#if 0\n// \\\n#endif\nN\n#endif\n",
+        "#if 0\n/* a\n*/ #endif\nN\n",
+        "#if 0\na # else\n#/**/else\nN\n#\\\nendif\nN\n",
+        "#if 0\n  /* a */ # /* b */ endif\nN\n",
+        "#if 0\nN\n",
+        "#if 0\n/* no end\n#endif\n",
+        "#if 0\n\"N\r\n#endif\r\nN\n",
+        "#if 0\n0x1g 1e5 08 \0 \xE9\n#endif\nN\n"s,
+        "#if 0\n#endif",
+        "#if 0\n#endi",
+        "#if 0\n#",
+        "#if 0\n\n\n\n#else N\nN\n#endif N\nN\n",
+        "#if 0\n#ifdef\n#ifndef N\n#else\n#else\n#endif\n#endif\n#endif\nN\n",
+    });
+}
+
+TEST(Roads, AgreeOnMacros) {
+    expectSameOnAllRoads({
+        "F(1) F (2) F( 3 ) F\n(4) F\n\n\n(5) F\nN\n",
+        "F(\n1\n,\n2\n)\nN\n",
+        "H(1,\n 2) N\nN\n",
+        "H(1\n#define N 4\n, 2)\n",
+        "F(/* a\nb */ 1) N\nN\n",
+        "F /* a\nb */ (1) N\nN\n",
+        "F // a\n(1) N\nN\n",
+        "F(\"N\nN) N\n",
+        "F(')') F(\"(\") N\n",
+        "F(1\n",
+        "F(",
+        "F",
+        "F \n\n",
+        "H(1) H(1, 2, 3) G(1) G() G( ) N\n",
+        "EMPTY EMPTY\nEMPTY\nN EMPTY\n",
+        "EMPTY#define M 1\nEMPTY # define M 1\nM\n",
+        "S(a  \"b\\n\" 'c' \\\n d) N\n",
+        "J(N, 1) J(1, N) J(F, )(1) J(<, <) J(/, /) N\n",
+        "F(F(F(N))) F(F)(N) N\n",
+        "__FILE__ __LINE__ F(__LINE__\n) __LINE__\n",
+        "#undef N\nN F(N)\n#define N 5\nN\n",
+        "NN N N1 xN N.N N->N N::N N+N-N*N/N\n",
+        "F\\\n(1) F(1\\\n) N\n",
+    });
+}
+
+TEST(Roads, AgreeOnHashesInALine) {
+    expectSameOnAllRoads({
+        "a # N ## N #define N 4\nN\n",
+        "##\n## N\n#N\n# N\n#\n#   \n#1\n#\"N\n#'\nN\n",
+        "F(#) F(##) F(\n#\n) N\n",
+        "  # define M N\nM\n\t#\tundef M\nM\n",
+        "N #\nN #",
+        "a #if 0\nN\n#endif\n",
+        "#unknown N\nN\n#Define N 4\nN\n#define\n#define 1\n#undef\nN\n",
+        "?\?=define M 1\n%:define M 1\nM N\n",
+    });
+}
+
+TEST(Roads, AgreeOnLineControl) {
+    expectSameOnAllRoads({
+        "#line 10\nN __LINE__\n\n\nN\n",
+        "#line 10 \"other\"\nN __LINE__ __FILE__\n#unknown\n",
+        "#line N\n__LINE__\n#line N \"a\" N\n__LINE__\n",
+        "#line\n#line x\n#line 0\n#line 08\n#line 0x1\n#line 1L\n#line 4294967297\nN\n",
+        "#line 99999999999999999999\nN __LINE__\nN\n",
+        "#line 10 /* a\nb */ \"c\"\nN __LINE__\n",
+        "#line 10 \"no end\nN\n",
+        "#line 2147483647\nN __LINE__\nN __LINE__\n",
+        "#pragma N \"N\" /* N */ F(1) \\\n N\nN\n",
+        "#pragma\nN\n#pragma  a  b\nN\n#pragma \"N\nN\n#pragma // N\nN\n",
+        "#pragma x",
+        "#error N \"N\n#error\n#error a \\\n b /* c\nd */ e\nN\n#error x",
+        "\n\n\n\n\n\n\n\n\n\n\n\nN\n\n#define M\n\nM\n\n\n",
+    });
+}
+
+TEST(Roads, AgreeOnConditions) {
+    expectSameOnAllRoads({
+        "#if N == 3 && defined(N) && !defined X\nN\n#else\nno\n#endif\n",
+        "#if\n#elif N\nN\n#endif\n#if 1 1\nN\n#endif\n#if (1\nN\n#endif\n",
+        "#if 1 / 0\nN\n#endif\nN\n",
+        "#if N /* a\nb */ > 2\nN\n#endif\n",
+        "#if 'a' == 97 \\\n && \"N\"\nN\n#endif\nN\n",
+        "#if F(1\n#endif\nN\n",
+        "#endif\n#else\n#elif 1\nN\n#if 1\n#else\n#else\n#elif 1\n#endif x\nN\n",
+        "#ifdef N x\nN\n#endif\n#ifndef\nN\n#endif\n#ifdef 1\nN\n#else\nN\n#endif\n#if 1\n",
+        "N\n#if (-2147483647 - 1) / -1\nN\n#endif\nN\n",
+    });
+}
+
+TEST(Roads, AgreeOnLongLines) {
+    const std::string words = [] {
+        std::string text;
+        while (text.size() < 3000) {
+            text.append("word N 0x1g \"N\" 'c' /* N */ F(1) + ");
+        }
+        return text;
+    }();
+    const std::string name(2000, 'n');
+    expectSameOnAllRoads({
+        words,
+        "\"" + words,
+        "/*" + name + "*/ N\n// " + name + "\nN\n",
+        "#define " + name + " 1\n" + name + " " + name + "x N\n",
+        "\"" + name + "\" '" + name + "' N\n",
+        std::string(1000, ' ') + "#define M 1\nM" + std::string(1000, ' ') + "N\n",
+        std::string(500, '\n') + "N\n",
+        "#if 0\n" + std::string(500, '\n') + name + "\n#endif\nN\n",
+        "#if 0\n/*" + std::string(500, '\n') + "#endif */\n#endif\nN\n",
+    });
+}
+
+TEST(Roads, AgreeOnIncludedFiles) {
+    const testing::TemporaryDirectory directory;
+    const std::string name = directory.write("one.h", "N \"N\n#if 0\n'N\n#else\nN F(\n");
+    const std::string empty = directory.write("empty.h", "");
+    const std::string quoted = "#include \"" + name + "\"\n";
+    expectSameOnAllRoads({
+        quoted + "1) N\nN\n",
+        quoted + quoted + "N",
+        "#include \"" + empty + "\"\nN\n#include \"" + empty + "\"",
+        "F(\n" + quoted + ") N\n",
+        "#if 0\n" + quoted + "#endif\nN\n",
+        "#include \"" + directory.nameOf("none.h") + "\"\nN\n",
+        "#include <none.h\nN\n#include\nN\n#include N\nN\n",
+    });
+}
+
+}  // namespace
+}  // namespace umpre

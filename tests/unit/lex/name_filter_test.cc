@@ -1,0 +1,70 @@
+// SPDX-License-Identifier: MIT
+#include "lex/name_filter.h"
+
+#include <string>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+namespace umpre {
+namespace {
+
+using std::string_view_literals::operator""sv;
+
+[[nodiscard]] std::vector<std::string> manyNames(const std::string& stem) {
+    constexpr int kCount = 2000;
+    std::vector<std::string> names;
+    names.reserve(kCount);
+    for (int number = 0; number < kCount; ++number) {
+        names.push_back(stem + std::to_string(number));
+    }
+    return names;
+}
+
+TEST(NameFilter, HoldsNothingAtFirst) {
+    const NameFilter filter;
+    for (const std::string& name : manyNames("name_")) {
+        EXPECT_FALSE(filter.mayHold(name)) << name;
+    }
+}
+
+TEST(NameFilter, LetsEveryNamePassThatWasAdded) {
+    NameFilter filter;
+    for (const std::string& name : manyNames("")) {
+        filter.add(name);
+    }
+    for (const std::string& name : manyNames("a_name_of_some_length_")) {
+        filter.add(name);
+    }
+    for (const std::string& name : manyNames("")) {
+        EXPECT_TRUE(filter.mayHold(name)) << name;
+    }
+    for (const std::string& name : manyNames("a_name_of_some_length_")) {
+        EXPECT_TRUE(filter.mayHold(name)) << name;
+    }
+}
+
+TEST(NameFilter, StopsNearlyAllOtherNames) {
+    NameFilter filter;
+    for (const std::string& name : manyNames("added_")) {
+        filter.add(name);
+    }
+    int passed = 0;
+    for (const std::string& name : manyNames("other_")) {
+        passed += filter.mayHold(name) ? 1 : 0;
+    }
+    EXPECT_LT(passed, 200);
+}
+
+TEST(NameFilter, TellsTheEmptyNameFromAZeroByte) {
+    EXPECT_NE(hashOfName(""), hashOfName("\0"sv));
+    EXPECT_NE(hashOfName("\0"sv), hashOfName("\0\0"sv));
+}
+
+TEST(NameFilter, HashesByTheBytesAlone) {
+    const std::string text = "xx_some_name_xx";
+    EXPECT_EQ(hashOfName(std::string_view(text).substr(3, 9)), hashOfName("some_name"));
+}
+
+}  // namespace
+}  // namespace umpre

@@ -1,0 +1,396 @@
+// SPDX-License-Identifier: MIT
+#include "lex/scanner_stack.h"
+
+#include <memory>
+#include <string>
+#include <unistd.h>
+
+#include <gtest/gtest.h>
+
+#include "support/descriptors.h"
+#include "support/lexeme.h"
+#include "support/source_fixture.h"
+#include "support/temporary_directory.h"
+
+namespace umpre {
+namespace {
+
+using testing::lexemeOf;
+using testing::SourceFixture;
+using enum TokenKind;
+
+TEST(ScannerStack, ReadsTheMainFileToItsEnd) {
+    SourceFixture f("a b\n");
+    EXPECT_EQ(f.sources.peek(), IDENTIFIER);
+    EXPECT_EQ(f.rest(), "a b\n");
+    EXPECT_EQ(f.sources.peek(), END_OF_INPUT);
+    EXPECT_EQ(f.sources.next().kind, END_OF_INPUT);
+}
+
+TEST(ScannerStack, TheMainFileStaysTheCurrentOneAtItsEnd) {
+    SourceFixture f("a\n");
+    (void)f.rest();
+    EXPECT_EQ(f.sources.position().fileName, "main");
+    EXPECT_EQ(f.sources.position().line, 2);
+    EXPECT_EQ(f.fileEvents.events(), "+main");
+}
+
+TEST(ScannerStack, HasAFileOnceOneIsPushed) {
+    testing::RecordingFileEvents events;
+    OutputWriter output;
+    testing::RecordingReporter reporter;
+    ScannerStack sources(events, output, reporter, {});
+    events.watch(sources);
+    EXPECT_FALSE(sources.hasFile());
+    sources.pushFileText("main", "");
+    EXPECT_TRUE(sources.hasFile());
+}
+
+TEST(ScannerStack, GoesOnBelowASourceThatIsReadToItsEnd) {
+    SourceFixture f("below\n");
+    f.pushText("top ");
+    f.pushText("most ");
+    EXPECT_EQ(f.rest(), "most top below\n");
+}
+
+TEST(ScannerStack, GoesOnInTheMiddleOfASource) {
+    SourceFixture f("a b c");
+    EXPECT_EQ(f.sources.next().text, "a");
+    f.pushText("x");
+    EXPECT_EQ(f.rest(), "x b c");
+}
+
+TEST(ScannerStack, PeekingGoesOnBelowToo) {
+    SourceFixture f("a");
+    f.pushText("");
+    f.pushText("");
+    EXPECT_EQ(f.sources.peek(), IDENTIFIER);
+    EXPECT_EQ(f.sources.next().text, "a");
+}
+
+TEST(ScannerStack, ATokenLookedAheadAtIsKeptBelowANewSource) {
+    SourceFixture f("a b");
+    EXPECT_EQ(f.sources.peek(), IDENTIFIER);
+    f.pushText("x ");
+    EXPECT_EQ(f.rest(), "x a b");
+}
+
+TEST(ScannerStack, ReadsASharedText) {
+    SourceFixture f("!");
+    auto text = std::make_shared<LexedText>();
+    text->append(IDENTIFIER, "a");
+    f.sources.pushShared(text, {});
+    f.sources.pushShared(text, {});
+    EXPECT_EQ(f.rest(), "aa!");
+}
+
+TEST(ScannerStack, TheSetIsThatOfTheSourceReadNow) {
+    NoExpandSets sets;
+    const Name name{"n"};
+    const NoExpandSet set = sets.with({}, name);
+    SourceFixture f("b");
+    f.pushText("a", set);
+    EXPECT_EQ(f.sources.next().text, "a");
+    EXPECT_EQ(f.sources.noExpandSet(), set);
+    EXPECT_EQ(f.sources.next().text, "b");
+    EXPECT_EQ(f.sources.noExpandSet(), NoExpandSet());
+}
+
+TEST(ScannerStack, TheSetChangesWhenTheNextSourceIsPeekedInto) {
+    NoExpandSets sets;
+    const Name name{"n"};
+    SourceFixture f("b");
+    f.pushText("a", sets.with({}, name));
+    (void)f.sources.next();
+    (void)f.sources.peek();
+    EXPECT_EQ(f.sources.noExpandSet(), NoExpandSet());
+}
+
+TEST(ScannerStack, AFileInsideAFileTellsItsBeginningAndEnd) {
+    SourceFixture f("a\nb\n");
+    (void)f.sources.next();
+    f.sources.pushFileText("inner", "x\n");
+    EXPECT_EQ(f.fileEvents.events(), "+main +inner");
+    EXPECT_EQ(f.rest(), "x\n\nb\n");
+    EXPECT_EQ(f.fileEvents.events(), "+main +inner -inner =main");
+}
+
+TEST(ScannerStack, AFileEndsWhenReadingGoesOnBelowIt) {
+    SourceFixture f("a");
+    f.sources.pushFileText("inner", "x\n");
+    (void)f.sources.next();
+    (void)f.sources.next();
+    EXPECT_EQ(f.fileEvents.events(), "+main +inner");
+    (void)f.sources.peek();
+    EXPECT_EQ(f.fileEvents.events(), "+main +inner -inner =main");
+}
+
+TEST(ScannerStack, FilesThatEndTogetherEndOneAfterTheOther) {
+    SourceFixture f("");
+    f.sources.pushFileText("one", "");
+    f.sources.pushFileText("two", "");
+    EXPECT_EQ(f.sources.next().kind, END_OF_INPUT);
+    EXPECT_EQ(f.fileEvents.events(), "+main +one +two -two =one -one =main");
+}
+
+TEST(ScannerStack, ListsTellNothing) {
+    SourceFixture f("a");
+    f.pushText("x");
+    EXPECT_EQ(f.rest(), "xa");
+    EXPECT_EQ(f.fileEvents.events(), "+main");
+}
+
+TEST(ScannerStack, ThePositionIsThatOfTheFileWhileAListIsRead) {
+    SourceFixture f("a\n\nb\n");
+    (void)f.sources.next();
+    (void)f.sources.next();
+    (void)f.sources.next();
+    f.pushText("x\ny\n");
+    (void)f.sources.next();
+    (void)f.sources.next();
+    EXPECT_EQ(f.sources.position().fileName, "main");
+    EXPECT_EQ(f.sources.position().line, 3);
+}
+
+TEST(ScannerStack, ThePositionFollowsTheInnermostFile) {
+    SourceFixture f("a\nb\n");
+    (void)f.sources.next();
+    (void)f.sources.next();
+    f.sources.pushFileText("inner", "x");
+    EXPECT_EQ(f.sources.position().fileName, "inner");
+    EXPECT_EQ(f.sources.position().line, 1);
+    EXPECT_EQ(f.rest(), "xb\n");
+    EXPECT_EQ(f.sources.position().fileName, "main");
+}
+
+TEST(ScannerStack, TheCurrentFileCanBeRenamed) {
+    SourceFixture f("a\n");
+    f.sources.currentFile().setFileName("other");
+    f.sources.currentFile().setLine(7);
+    EXPECT_EQ(f.sources.position().fileName, "other");
+    EXPECT_EQ(f.sources.position().line, 7);
+}
+
+TEST(ScannerStack, AFileIsReadNowIfItLiesOnTop) {
+    SourceFixture f("a");
+    EXPECT_EQ(f.sources.fileReadNow(), &f.sources.currentFile());
+    f.pushText("x");
+    EXPECT_EQ(f.sources.fileReadNow(), nullptr);
+    (void)f.sources.next();
+    EXPECT_EQ(f.sources.fileReadNow(), nullptr);
+    (void)f.sources.next();
+    EXPECT_EQ(f.sources.fileReadNow(), &f.sources.currentFile());
+}
+
+TEST(ScannerStack, OpensFilesByName) {
+    const testing::TemporaryDirectory directory;
+    const std::string name = directory.write("inner", "x\n");
+    SourceFixture f("a\n");
+    ASSERT_TRUE(f.sources.pushFile(name));
+    EXPECT_EQ(f.sources.position().fileName, name);
+    EXPECT_EQ(f.rest(), "x\na\n");
+}
+
+TEST(ScannerStack, AMessageNameReplacesTheFileName) {
+    const testing::TemporaryDirectory directory;
+    SourceFixture f("");
+    ASSERT_TRUE(f.sources.pushFile(directory.write("inner", "x\n"), "called"));
+    EXPECT_EQ(f.sources.position().fileName, "called");
+    EXPECT_EQ(f.fileEvents.events(), "+main +called");
+}
+
+TEST(ScannerStack, AnEmptyFileNameIsStandardInput) {
+    const testing::Pipe pipe("x\n");
+    const testing::Replaced standardInput(STDIN_FILENO, pipe.readEnd());
+    SourceFixture f("a\n");
+    ASSERT_TRUE(f.sources.pushFile(""));
+    EXPECT_EQ(f.sources.position().fileName, "stdin");
+    EXPECT_EQ(f.rest(), "x\na\n");
+}
+
+TEST(ScannerStack, AFileThatCannotBeOpenedChangesNothing) {
+    const testing::TemporaryDirectory directory;
+    SourceFixture f("a\n");
+    EXPECT_FALSE(f.sources.pushFile(directory.nameOf("nothing")));
+    EXPECT_FALSE(f.sources.pushFile(directory.name(), "called"));
+    EXPECT_EQ(f.sources.position().fileName, "main");
+    EXPECT_EQ(f.fileEvents.events(), "+main");
+    EXPECT_EQ(f.rest(), "a\n");
+    EXPECT_TRUE(f.reporter.reports().empty());
+}
+
+TEST(ScannerStack, TheSameFileCanBeOpenAtManyDepths) {
+    const testing::TemporaryDirectory directory;
+    const std::string name = directory.write("inner", "x y\n");
+    SourceFixture f("");
+    constexpr int kDepth = 100;
+    std::string expected;
+    for (int depth = 0; depth < kDepth; ++depth) {
+        ASSERT_TRUE(f.sources.pushFile(name));
+        EXPECT_EQ(f.sources.next().text, "x");
+        expected += " y\n";
+    }
+    EXPECT_EQ(f.rest(), expected);
+}
+
+TEST(ScannerStack, SkipsBlanksAndReturnsThem) {
+    SourceFixture f(" \t\\\n/* c */a\n");
+    EXPECT_EQ(f.sources.skipBlanks(), " \t\\\n ");
+    EXPECT_EQ(f.sources.next().text, "a");
+    EXPECT_EQ(f.sources.skipBlanks(), "");
+    EXPECT_EQ(f.sources.peek(), NEWLINE);
+}
+
+TEST(ScannerStack, SkipsBlanksThroughTheEndsOfSources) {
+    SourceFixture f(" a");
+    f.pushText(" ");
+    f.pushText(" \t");
+    EXPECT_EQ(f.sources.skipBlanks(), " \t  ");
+    EXPECT_EQ(f.sources.next().text, "a");
+}
+
+TEST(ScannerStack, SkipsLineEndsToo) {
+    SourceFixture f(" \n\r\n\ta");
+    std::string skipped = "old";
+    EXPECT_TRUE(f.sources.skipBlanksAndNewlines(skipped));
+    EXPECT_EQ(skipped, " \n\n\t");
+    EXPECT_EQ(f.sources.next().text, "a");
+}
+
+TEST(ScannerStack, TellsThatNothingWasSkipped) {
+    SourceFixture f("a");
+    std::string skipped = "old";
+    EXPECT_FALSE(f.sources.skipBlanksAndNewlines(skipped));
+    EXPECT_EQ(skipped, "");
+}
+
+TEST(ScannerStack, ALineEndWithoutTextIsSkippedAsWell) {
+    SourceFixture f("a");
+    (void)f.sources.next();
+    std::string skipped;
+    EXPECT_TRUE(f.sources.skipBlanksAndNewlines(skipped));
+    EXPECT_EQ(skipped, "");
+    EXPECT_EQ(f.sources.next().kind, END_OF_INPUT);
+}
+
+TEST(ScannerStack, SkipsToTheEndOfTheLineIncluded) {
+    SourceFixture f("a b \\\n c\nd\n");
+    f.sources.skipToEndOfLine();
+    EXPECT_EQ(f.sources.next().text, "d");
+}
+
+TEST(ScannerStack, SkippingToTheEndOfTheLineConsumesAtLeastOneToken) {
+    SourceFixture f("\na\nb\n");
+    f.sources.skipToEndOfLine();
+    EXPECT_EQ(f.sources.next().text, "a");
+    (void)f.sources.next();
+    f.sources.skipToEndOfLine();
+    EXPECT_EQ(f.sources.next().kind, END_OF_INPUT);
+}
+
+TEST(ScannerStack, AnIsolatedSourceEndsByItself) {
+    SourceFixture f("a b");
+    (void)f.sources.next();
+    Pieces pieces = f.piecesOf("x y");
+    f.sources.isolate(pieces);
+    EXPECT_EQ(f.rest(), "x y");
+    EXPECT_EQ(f.sources.peek(), END_OF_INPUT);
+    EXPECT_EQ(f.sources.next().kind, END_OF_INPUT);
+    f.sources.endIsolation();
+    EXPECT_EQ(f.rest(), " b");
+}
+
+TEST(ScannerStack, SourcesPushedDuringAnIsolationBelongToIt) {
+    SourceFixture f("a");
+    Pieces pieces = f.piecesOf("x");
+    f.sources.isolate(pieces);
+    f.pushText("y ");
+    EXPECT_EQ(f.rest(), "y x");
+    f.sources.endIsolation();
+    EXPECT_EQ(f.rest(), "a");
+}
+
+TEST(ScannerStack, IsolationsNest) {
+    SourceFixture f("a");
+    Pieces outer = f.piecesOf("x ");
+    f.sources.isolate(outer);
+    Pieces inner = f.piecesOf("y ");
+    f.sources.isolate(inner);
+    EXPECT_EQ(f.rest(), "y ");
+    f.sources.endIsolation();
+    EXPECT_EQ(f.rest(), "x ");
+    f.sources.endIsolation();
+    EXPECT_EQ(f.rest(), "a");
+}
+
+TEST(ScannerStack, WhatIsLeftOfAnIsolatedSourceIsDropped) {
+    SourceFixture f("a");
+    Pieces pieces = f.piecesOf("x y z");
+    f.sources.isolate(pieces);
+    (void)f.sources.next();
+    f.sources.endIsolation();
+    EXPECT_EQ(f.rest(), "a");
+}
+
+TEST(ScannerStack, AnExhaustedIsolatedSourceStaysWhenAnotherIsPushed) {
+    SourceFixture f("a");
+    Pieces pieces = f.piecesOf("x");
+    f.sources.isolate(pieces);
+    (void)f.sources.next();
+    f.pushText("y");
+    EXPECT_EQ(f.rest(), "y");
+    f.sources.endIsolation();
+    EXPECT_EQ(f.rest(), "a");
+}
+
+TEST(ScannerStack, ManyListsMayFollowEachOther) {
+    SourceFixture f("a");
+    constexpr int kCount = 100'000;
+    for (int count = 0; count < kCount; ++count) {
+        f.pushText("x");
+        EXPECT_EQ(f.sources.next().text, "x");
+    }
+    EXPECT_EQ(f.rest(), "a");
+}
+
+TEST(ScannerStack, ManyListsMayWaitForEachOther) {
+    SourceFixture f("a");
+    constexpr std::size_t kCount = 10'000;
+    for (std::size_t count = 0; count < kCount; ++count) {
+        f.pushText("x");
+    }
+    EXPECT_EQ(f.rest(), std::string(kCount, 'x') + "a");
+}
+
+TEST(ScannerStack, CommentsInFilesAndListsActOnOutputAndReports) {
+    SourceFixture f("/*\n\n*/a/*\n");
+    EXPECT_EQ(f.sources.commentEffects(), 0U);
+    f.pushText("/*\n*/");
+    EXPECT_EQ(f.rest(), "  a ");
+    EXPECT_EQ(f.written(), "\n\n\n\n");
+    EXPECT_EQ(f.reporter.report(), "4: unterminated comment");
+    EXPECT_GT(f.sources.commentEffects(), 0U);
+}
+
+TEST(ScannerStack, CommentsOnOneLineHaveNoEffects) {
+    SourceFixture f("/* a */ // b\n");
+    (void)f.rest();
+    EXPECT_EQ(f.sources.commentEffects(), 0U);
+}
+
+TEST(ScannerStack, CarriesOutTheEffectsOfATextThatItDoesNotRead) {
+    SourceFixture f("");
+    LexedText text;
+    text.append(IDENTIFIER, "a");
+    text.addCommentEffect(2, true, 3);
+    text.append(WHITESPACE, " ");
+    f.sources.carryOutEffects(text, 0);
+    EXPECT_EQ(f.sources.commentEffects(), 0U);
+    f.sources.carryOutEffects(text, 1);
+    EXPECT_EQ(f.sources.commentEffects(), 2U);
+    EXPECT_EQ(f.written(), "\n\n");
+    EXPECT_EQ(f.reporter.report(), "3: unterminated comment");
+}
+
+}  // namespace
+}  // namespace umpre

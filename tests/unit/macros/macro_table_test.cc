@@ -1,0 +1,206 @@
+// SPDX-License-Identifier: MIT
+#include "macros/macro_table.h"
+
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+namespace umpre {
+namespace {
+
+using std::string_view_literals::operator""sv;
+using Definition = MacroTable::Definition;
+
+[[nodiscard]] Macro objectLike(std::string text) {
+    return {std::move(text), {}, false};
+}
+
+[[nodiscard]] Macro functionLike(std::string text, std::vector<std::string> parameters) {
+    return {std::move(text), std::move(parameters), true};
+}
+
+// Returns a defined name's text, or nothing.
+[[nodiscard]] std::string textOf(MacroTable& macros, std::string_view name) {
+    const MacroName* const found = macros.find(name);
+    return found == nullptr ? "(not defined)" : found->macro->text;
+}
+
+TEST(MacroTable, FindsNothingAtFirst) {
+    MacroTable macros;
+    EXPECT_EQ(macros.find("A"), nullptr);
+    EXPECT_EQ(macros.find(""), nullptr);
+}
+
+TEST(MacroTable, FindsWhatWasDefined) {
+    MacroTable macros;
+    EXPECT_EQ(macros.define("A", objectLike("1")), Definition::Added);
+    const MacroName* const found = macros.find("A");
+    ASSERT_NE(found, nullptr);
+    EXPECT_EQ(found->text, "A");
+    EXPECT_EQ(found->macro->text, "1");
+    EXPECT_FALSE(found->macro->functionLike);
+}
+
+TEST(MacroTable, KeepsParametersInTheirOrder) {
+    MacroTable macros;
+    macros.define("F", functionLike("x", {"b", "a", "b"}));
+    EXPECT_EQ(macros.find("F")->macro->parameters, (std::vector<std::string>{"b", "a", "b"}));
+    EXPECT_TRUE(macros.find("F")->macro->functionLike);
+}
+
+TEST(MacroTable, AFunctionLikeMacroMayHaveNoParameters) {
+    MacroTable macros;
+    macros.define("F", functionLike("1", {}));
+    EXPECT_TRUE(macros.find("F")->macro->functionLike);
+    EXPECT_TRUE(macros.find("F")->macro->parameters.empty());
+}
+
+TEST(MacroTable, NamesAreBytes) {
+    MacroTable macros;
+    macros.define("a", objectLike("lower"));
+    macros.define("A", objectLike("upper"));
+    macros.define("", objectLike("empty"));
+    macros.define("a\0"sv, objectLike("zero"));
+    macros.define("a\0b"sv, objectLike("more"));
+    EXPECT_EQ(textOf(macros, "a"), "lower");
+    EXPECT_EQ(textOf(macros, "A"), "upper");
+    EXPECT_EQ(textOf(macros, ""), "empty");
+    EXPECT_EQ(textOf(macros, "a\0"sv), "zero");
+    EXPECT_EQ(textOf(macros, "a\0b"sv), "more");
+    EXPECT_EQ(textOf(macros, "a\0c"sv), "(not defined)");
+}
+
+TEST(MacroTable, TheSameTextChangesNothing) {
+    MacroTable macros;
+    macros.define("F", functionLike("x", {"x"}));
+    EXPECT_EQ(macros.define("F", objectLike("x")), Definition::Same);
+    EXPECT_TRUE(macros.find("F")->macro->functionLike);
+    EXPECT_EQ(macros.find("F")->macro->parameters, std::vector<std::string>{"x"});
+}
+
+TEST(MacroTable, AnotherTextReplacesTheWholeDefinition) {
+    MacroTable macros;
+    macros.define("F", functionLike("x", {"x"}));
+    EXPECT_EQ(macros.define("F", objectLike("y")), Definition::Replaced);
+    EXPECT_EQ(textOf(macros, "F"), "y");
+    EXPECT_FALSE(macros.find("F")->macro->functionLike);
+    EXPECT_TRUE(macros.find("F")->macro->parameters.empty());
+}
+
+TEST(MacroTable, DefineMacroKeepsWhatIsDefined) {
+    MacroTable macros;
+    macros.defineMacro("A", "1");
+    macros.defineMacro("A", "2");
+    EXPECT_EQ(textOf(macros, "A"), "1");
+}
+
+TEST(MacroTable, DefineMacroTakesTheTextAsItIs) {
+    MacroTable macros;
+    macros.defineMacro("A", "  x   y ");
+    EXPECT_EQ(textOf(macros, "A"), "  x   y ");
+    EXPECT_FALSE(macros.find("A")->macro->functionLike);
+}
+
+TEST(MacroTable, AnUndefinedNameIsNotFound) {
+    MacroTable macros;
+    macros.define("A", objectLike("1"));
+    macros.define("B", objectLike("2"));
+    macros.undefine("A");
+    EXPECT_EQ(macros.find("A"), nullptr);
+    EXPECT_EQ(textOf(macros, "B"), "2");
+}
+
+TEST(MacroTable, UndefiningWhatIsNotDefinedDoesNothing) {
+    MacroTable macros;
+    macros.undefine("A");
+    macros.define("B", objectLike("2"));
+    macros.undefine("A");
+    macros.undefine("B");
+    macros.undefine("B");
+    EXPECT_EQ(macros.find("B"), nullptr);
+}
+
+TEST(MacroTable, AnUndefinedNameCanBeDefinedAgain) {
+    MacroTable macros;
+    macros.define("A", objectLike("1"));
+    macros.undefine("A");
+    EXPECT_EQ(macros.define("A", objectLike("1")), Definition::Added);
+    macros.undefine("A");
+    macros.defineMacro("A", "3");
+    EXPECT_EQ(textOf(macros, "A"), "3");
+}
+
+TEST(MacroTable, AnEntryStaysWhereItIs) {
+    MacroTable macros;
+    macros.define("A", objectLike("1"));
+    MacroName* const entry = macros.find("A");
+    for (int number = 0; number < 3000; ++number) {
+        macros.define("N" + std::to_string(number), objectLike(""));
+    }
+    macros.undefine("A");
+    macros.define("A", objectLike("2"));
+    EXPECT_EQ(macros.find("A"), entry);
+    EXPECT_EQ(entry->text, "A");
+    EXPECT_EQ(entry->macro->text, "2");
+}
+
+TEST(MacroTable, ADefinitionOutlivesItsNameWhereItIsHeld) {
+    MacroTable macros;
+    macros.define("A", objectLike("1"));
+    const std::shared_ptr<const Macro> held = macros.find("A")->macro;
+    macros.define("A", objectLike("2"));
+    macros.undefine("A");
+    EXPECT_EQ(held->text, "1");
+}
+
+TEST(MacroTable, HoldsThousandsOfNames) {
+    MacroTable macros;
+    constexpr int kCount = 5000;
+    const auto nameOf = [](int number) { return "NAME_" + std::to_string(number); };
+    for (int number = 0; number < kCount; ++number) {
+        EXPECT_EQ(macros.define(nameOf(number), objectLike(std::to_string(number))),
+                  Definition::Added);
+    }
+    for (int number = 0; number < kCount; number += 3) {
+        macros.undefine(nameOf(number));
+    }
+    for (int number = 0; number < kCount; number += 6) {
+        macros.define(nameOf(number), objectLike("again"));
+    }
+    for (int number = 0; number < kCount; ++number) {
+        const std::string expected = number % 6 == 0   ? "again"
+                                     : number % 3 == 0 ? "(not defined)"
+                                                       : std::to_string(number);
+        EXPECT_EQ(textOf(macros, nameOf(number)), expected);
+    }
+}
+
+TEST(MacroTable, EveryDefinedNamePassesTheFilter) {
+    MacroTable macros;
+    for (int number = 0; number < 2000; ++number) {
+        const std::string name = "N" + std::to_string(number);
+        if (number % 2 == 0) {
+            macros.define(name, objectLike(""));
+        } else {
+            macros.defineMacro(name, "");
+        }
+        EXPECT_TRUE(macros.filter().mayHold(name));
+    }
+    macros.undefine("N0");
+    macros.define("N0", objectLike("1"));
+    for (int number = 0; number < 2000; ++number) {
+        EXPECT_TRUE(macros.filter().mayHold("N" + std::to_string(number)));
+    }
+}
+
+TEST(MacroTable, TheFilterStopsNamesNeverDefined) {
+    const MacroTable macros;
+    EXPECT_FALSE(macros.filter().mayHold("a"));
+    EXPECT_FALSE(macros.filter().mayHold("anything"));
+}
+
+}  // namespace
+}  // namespace umpre

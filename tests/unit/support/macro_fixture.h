@@ -1,0 +1,60 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_TESTS_UNIT_SUPPORT_MACRO_FIXTURE_H
+#define UMPRE_TESTS_UNIT_SUPPORT_MACRO_FIXTURE_H
+
+#include <string>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+#include "macros/macro_expander.h"
+#include "macros/macro_table.h"
+#include "support/source_fixture.h"
+
+namespace umpre::testing {
+
+/// A definition as a test writes it: `{"F", {"x", "y"}, "x + y"}`.
+struct Definition {
+    std::string name;
+    std::vector<std::string> parameters;
+    std::string text;
+};
+
+/// Sources with macros.
+struct MacroFixture : SourceFixture {
+    explicit MacroFixture(std::string_view text, const RunOptions& runOptions = {})
+        : SourceFixture(text, runOptions), expander(sources, macros, reporter, lexer) {}
+
+    /// Enters an object-like macro.
+    void define(std::string_view name, std::string_view text) {
+        macros.define(name, Macro(std::string(text), {}, false));
+    }
+
+    /// Enters a function-like macro.
+    void define(const Definition& definition) {
+        macros.define(definition.name, Macro(definition.text, definition.parameters, true));
+    }
+
+    void define(const std::vector<Definition>& definitions) {
+        for (const Definition& definition : definitions) {
+            define(definition);
+        }
+    }
+
+    /// Reads everything as text: names go through the expander, the rest is taken as it is.
+    [[nodiscard]] std::string expanded() {
+        std::string result;
+        for (Token token = sources.next(); token.kind != TokenKind::END_OF_INPUT;
+             token = sources.next()) {
+            result.append(isName(token.kind) ? expander.expandName(token.text) : token.text);
+        }
+        return result;
+    }
+
+    MacroTable macros;
+    MacroExpander expander;
+};
+
+}  // namespace umpre::testing
+
+#endif
