@@ -7,6 +7,8 @@
 // clears no more than where the two differ.
 #include "lex/no_expand_set.h"
 
+#include <functional>
+
 namespace umpre {
 namespace {
 
@@ -51,9 +53,9 @@ std::size_t NoExpandSets::KeyHash::operator()(const Key& key) const noexcept {
     // Multiplication by 2^64 divided by the golden ratio spreads the addresses (Knuth, The Art of
     // Computer Programming, volume 3, 6.4).
     constexpr std::uint64_t kGolden = 0x9E3779B97F4A7C15U;
-    const auto first = std::bit_cast<std::uintptr_t>(key.first) * kGolden;
-    const auto second = std::bit_cast<std::uintptr_t>(key.second);
-    return (first ^ first >> 32U ^ second) * kGolden >> 16U;
+    const std::hash<const void*> address;
+    const std::uint64_t first = address(key.first) * kGolden;
+    return (first ^ first >> 32U ^ address(key.second)) * kGolden >> 16U;
 }
 
 NoExpandSet NoExpandSets::with(NoExpandSet set, const Name& name) {
