@@ -5,8 +5,6 @@
 // nothing, so a backslash at the line end between "a" and "b" gives "ab".
 #include "directives/definitions.h"
 
-#include <utility>
-
 namespace umpre {
 
 using enum TokenKind;
@@ -17,17 +15,17 @@ void Definitions::defineDirective() {
         return;
     }
     const bool functionLike = sources_.peek() == LEFT_PARENTHESIS;
-    std::vector<std::string> parameters;
+    std::optional<std::string> parameters = std::string();
     if (functionLike) {
-        std::optional<std::vector<std::string>> list = readParameters();
-        if (!list) {
+        parameters = readParameters();
+        if (!parameters) {
             sources_.skipToEndOfLine();
             return;
         }
-        parameters = std::move(*list);
     }
-    Macro macro(readReplacement(), std::move(parameters), functionLike);
-    if (macros_.define(*name, std::move(macro)) == MacroTable::Definition::Replaced) {
+    const std::string text = readReplacement();
+    if (macros_.define(*name, {text, *parameters, functionLike})
+        == MacroTable::Definition::Replaced) {
         reporter_.reportWarning("Macro \"" + *name + "\" has an incompatible redefinition");
     }
     sources_.skipBlanks();
@@ -54,9 +52,10 @@ std::optional<std::string> Definitions::readMacroName() {
     return std::string(token.text);
 }
 
-// Reads from "(" to ")". Returns nothing after reporting an error, the offending token read.
-std::optional<std::vector<std::string>> Definitions::readParameters() {
-    std::vector<std::string> parameters;
+// Reads from "(" to ")" and returns the names, with commas between them. Returns nothing after
+// reporting an error, the offending token read.
+std::optional<std::string> Definitions::readParameters() {
+    std::string parameters;
     const auto nextInList = [this] {
         sources_.skipBlanks();
         return sources_.next();
@@ -71,7 +70,7 @@ std::optional<std::vector<std::string>> Definitions::readParameters() {
             reporter_.reportError("An identifier is expected");
             return std::nullopt;
         }
-        parameters.emplace_back(token.text);
+        parameters.append(token.text);
         token = nextInList();
         if (token.kind == RIGHT_PARENTHESIS) {
             return parameters;
@@ -80,6 +79,7 @@ std::optional<std::vector<std::string>> Definitions::readParameters() {
             reporter_.reportError("An ')' or ',' was expected");
             return std::nullopt;
         }
+        parameters.push_back(',');
         token = nextInList();
     }
 }

@@ -4,7 +4,6 @@
 
 #include <optional>
 #include <string>
-#include <vector>
 
 #include "lex/reporter.h"
 #include "lex/scanner_stack.h"
@@ -26,7 +25,7 @@ public:
 
 private:
     [[nodiscard]] std::optional<std::string> readMacroName();
-    [[nodiscard]] std::optional<std::vector<std::string>> readParameters();
+    [[nodiscard]] std::optional<std::string> readParameters();
     [[nodiscard]] std::string readReplacement();
 
     ScannerStack& sources_;

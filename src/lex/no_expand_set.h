@@ -6,7 +6,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <deque>
-#include <string>
+#include <string_view>
 #include <unordered_map>
 #include <vector>
 
@@ -15,7 +15,8 @@ namespace umpre {
 /// A macro's name. There is one such object for each spelling, so its address says which name it
 /// is.
 struct Name {
-    std::string text;
+    std::string_view text;
+    bool isDefined = false;         ///< there is a macro of this name now
     mutable bool isMarked = false;  ///< by NoExpandSets, which looks into large sets that way
 };
 

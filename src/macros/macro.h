@@ -2,10 +2,10 @@
 #ifndef UMPRE_MACROS_MACRO_H
 #define UMPRE_MACROS_MACRO_H
 
+#include <cstddef>
+#include <cstdint>
 #include <memory>
-#include <string>
-#include <utility>
-#include <vector>
+#include <string_view>
 
 #include "lex/no_expand_set.h"
 
@@ -13,27 +13,50 @@ namespace umpre {
 
 struct MacroBody;
 
-/// One definition. What it says never changes; its body is worked out at its first use.
-struct Macro {
-    Macro(std::string replacement, std::vector<std::string> names, bool hasParameterList)
-        : text(std::move(replacement)),
-          parameters(std::move(names)),
-          functionLike(hasParameterList) {}
-
+/// What a definition says, as views of somebody else's bytes.
+struct MacroText {
     /// The replacement: the tokens' texts with one space where blanks stood between two.
-    const std::string text;
-    /// In the order written; empty too for a list without names.
-    const std::vector<std::string> parameters;
+    std::string_view text;
+    /// The names in the order written, with commas between them: "a,b". Empty too for a list
+    /// without names.
+    std::string_view parameters;
     /// A "(" followed the name at once.
-    const bool functionLike;
+    bool functionLike = false;
+};
+
+/// One definition. Its bytes are the table's and stay until its name is defined anew; its body is
+/// worked out at its first use.
+class Macro {
+public:
+    [[nodiscard]] std::string_view text() const noexcept {
+        return {bytes_ + parametersSize_, textSize_};
+    }
+
+    /// The names of the parameters, as in MacroText.
+    [[nodiscard]] std::string_view parameters() const noexcept { return {bytes_, parametersSize_}; }
+
+    [[nodiscard]] std::size_t parameterCount() const noexcept { return parameterCount_; }
+
+    [[nodiscard]] bool functionLike() const noexcept { return functionLike_; }
 
     /// The text made ready for use; null until then.
     mutable std::shared_ptr<const MacroBody> body;
+
+private:
+    friend class MacroTable;
+
+    // The parameters, and behind them the text.
+    char* bytes_ = nullptr;
+    std::size_t capacity_ = 0;
+    std::size_t textSize_ = 0;
+    std::size_t parametersSize_ = 0;
+    std::uint32_t parameterCount_ = 0;
+    bool functionLike_ = false;
 };
 
-/// A name that was defined at least once. Null: it is not defined now.
+/// A name that was defined at least once, and its last definition.
 struct MacroName : Name {
-    std::shared_ptr<const Macro> macro;
+    Macro macro;
 };
 
 }  // namespace umpre

@@ -10,6 +10,7 @@
 // where the last one is the string literal of x.
 #include "macros/macro_body.h"
 
+#include <algorithm>
 #include <optional>
 #include <string_view>
 #include <unordered_map>
@@ -24,8 +25,11 @@ class BodyBuilder {
 public:
     BodyBuilder(const Macro& macro, const LexedText& text, MacroBody& body)
         : text_(text), body_(body) {
-        for (std::size_t index = 0; index < macro.parameters.size(); ++index) {
-            parameters_[macro.parameters[index]] = index;  // of two with one name, the last counts
+        std::string_view names = macro.parameters();
+        for (std::size_t index = 0; index < macro.parameterCount(); ++index) {
+            const std::size_t size = std::min(names.find(','), names.size());
+            parameters_[names.substr(0, size)] = index;  // of two with one name, the last counts
+            names.remove_prefix(std::min(size + 1, names.size()));
         }
     }
 
@@ -187,15 +191,15 @@ private:
 const std::shared_ptr<const MacroBody>& bodyOf(const Macro& macro, TextLexer& lexer) {
     if (macro.body == nullptr) {
         auto body = std::make_shared<MacroBody>();
-        if (macro.functionLike) {
+        if (macro.functionLike()) {
             LexedText source;
-            lexer.append(source, macro.text);
+            lexer.append(source, macro.text());
             BodyBuilder(macro, source, *body).build();
             if (source.hasEffects()) {
                 body->source = std::move(source);
             }
         } else {
-            lexer.append(body->tokens, macro.text);
+            lexer.append(body->tokens, macro.text());
         }
         macro.body = std::move(body);
     }

@@ -27,7 +27,7 @@ std::string_view MacroExpander::expandName(std::string_view name) {
     MacroName* macroName = nullptr;
     switch (lookAt(name, macroName)) {
     case Outcome::Name: return name;
-    case Outcome::Uncalled: written_ = skipped_ + macroName->text; return written_;
+    case Outcome::Uncalled: written_.assign(skipped_).append(macroName->text); return written_;
     case Outcome::Pushed: return {};
     case Outcome::Begun: finishInvocations(); return {};
     case Outcome::Abandoned: return macroName->text;
@@ -55,11 +55,11 @@ MacroExpander::Outcome MacroExpander::lookAt(std::string_view text, MacroName*& 
     if (name == nullptr || sets_.contains(sources_.noExpandSet(), *name)) {
         return Outcome::Name;
     }
-    refreshPredefined(*name, sources_.position());
-    if (name->macro->functionLike) {
+    refreshPredefined(macros_, *name, sources_.position());
+    if (name->macro.functionLike()) {
         return beginInvocation(*name);
     }
-    const std::shared_ptr<const MacroBody>& body = bodyOf(*name->macro, lexer_);
+    const std::shared_ptr<const MacroBody>& body = bodyOf(name->macro, lexer_);
     sources_.pushShared({body, &body->tokens}, sets_.with(sources_.noExpandSet(), *name));
     return Outcome::Pushed;
 }
@@ -67,18 +67,17 @@ MacroExpander::Outcome MacroExpander::lookAt(std::string_view text, MacroName*& 
 MacroExpander::Outcome MacroExpander::beginInvocation(const MacroName& name) {
     const NoExpandSet inherited = sources_.noExpandSet();
     // The definition stays the same while arguments are read: they hold no directives.
-    const std::shared_ptr<const Macro> macro = name.macro;
+    const Macro& macro = name.macro;
     (void)sources_.skipBlanksAndNewlines(skipped_);
     if (sources_.peek() != LEFT_PARENTHESIS) {
         return Outcome::Uncalled;
     }
     std::unique_ptr<Invocation> invocation = newInvocation();
-    if (!collectArguments(sources_, reporter_, macro->parameters.size(), invocation->arguments)) {
+    if (!collectArguments(sources_, reporter_, macro.parameterCount(), invocation->arguments)) {
         spare_.push_back(std::move(invocation));
         return Outcome::Abandoned;
     }
-    (void)bodyOf(*macro, lexer_);
-    invocation->macro = macro;
+    invocation->body = bodyOf(macro, lexer_);
     invocation->noExpand = sets_.with(inherited, name);
     invocations_.push_back(std::move(invocation));
     return Outcome::Begun;
@@ -120,7 +119,7 @@ void MacroExpander::pushReplacement() {
 
 // Returns false when an argument must be read first; the step is then taken again.
 bool MacroExpander::buildReplacement(Invocation& invocation) {
-    const MacroBody& body = *invocation.macro->body;
+    const MacroBody& body = *invocation.body;
     while (invocation.step < body.steps.size()) {
         const BodyStep& step = body.steps[invocation.step];
         switch (step.kind) {
@@ -189,7 +188,7 @@ void MacroExpander::endArgument(Invocation& invocation) {
 }
 
 void MacroExpander::addJoined(Invocation& invocation, const BodyStep& step) {
-    const MacroBody& body = *invocation.macro->body;
+    const MacroBody& body = *invocation.body;
     joined_.clear();
     for (std::size_t index = step.first; index < step.last; ++index) {
         const BodyOperand operand = body.operands[index];

@@ -53,7 +53,7 @@ private:
 
     // A function-like macro on its way to its replacement.
     struct Invocation {
-        std::shared_ptr<const Macro> macro;
+        std::shared_ptr<const MacroBody> body;
         NoExpandSet noExpand;  // of the replacement
         ArgumentList arguments;
         std::size_t step = 0;  // of the body, to be taken next

@@ -1,8 +1,12 @@
 // SPDX-License-Identifier: MIT
+//
+// Most definitions of a large input are never used, so what one costs is what storing it costs. The
+// bytes of names and definitions follow each other in large blocks; they are given back with the
+// table. A name that is defined anew uses its own bytes again, or takes at least twice as many, so
+// that what it takes is bounded by its longest definition, however often it is defined.
 #include "macros/macro_table.h"
 
-#include <memory>
-#include <utility>
+#include <algorithm>
 
 namespace umpre {
 namespace {
@@ -18,40 +22,57 @@ MacroName* MacroTable::find(std::string_view name) {
     if (slot.number == 0) {
         return nullptr;
     }
-    MacroName& found = names_[slot.number - 1];
-    return found.macro == nullptr ? nullptr : &found;
+    MacroName& found = nameIn(slot);
+    return found.isDefined ? &found : nullptr;
 }
 
 void MacroTable::defineMacro(std::string_view name, std::string_view text) {
     MacroName& entry = enter(name);
-    if (entry.macro == nullptr) {
-        entry.macro =
-            std::make_shared<const Macro>(std::string(text), std::vector<std::string>(), false);
+    if (!entry.isDefined) {
+        replace(entry, {text, {}, false});
     }
 }
 
-MacroTable::Definition MacroTable::define(std::string_view name, Macro macro) {
+MacroTable::Definition MacroTable::define(std::string_view name, const MacroText& definition) {
     MacroName& entry = enter(name);
-    if (entry.macro != nullptr && entry.macro->text == macro.text) {
+    const bool isAdded = !entry.isDefined;
+    if (!isAdded && entry.macro.text() == definition.text) {
         return Definition::Same;
     }
-    const bool added = entry.macro == nullptr;
-    entry.macro = std::make_shared<const Macro>(std::move(macro));
-    return added ? Definition::Added : Definition::Replaced;
+    replace(entry, definition);
+    return isAdded ? Definition::Added : Definition::Replaced;
+}
+
+void MacroTable::replace(MacroName& name, const MacroText& definition) {
+    Macro& macro = name.macro;
+    const std::size_t size = definition.parameters.size() + definition.text.size();
+    if (size > macro.capacity_) {
+        macro.capacity_ = std::max(size, 2 * macro.capacity_);
+        macro.bytes_ = newBytes(macro.capacity_);
+    }
+    macro.parametersSize_ = definition.parameters.copy(macro.bytes_, definition.parameters.size());
+    macro.textSize_ =
+        definition.text.copy(macro.bytes_ + macro.parametersSize_, definition.text.size());
+    const auto commas = std::count(definition.parameters.begin(), definition.parameters.end(), ',');
+    macro.parameterCount_ =
+        definition.parameters.empty() ? 0 : static_cast<std::uint32_t>(commas) + 1;
+    macro.functionLike_ = definition.functionLike;
+    macro.body.reset();
+    name.isDefined = true;
 }
 
 void MacroTable::undefine(std::string_view name) {
     MacroName* const entry = find(name);
     if (entry != nullptr) {
-        entry->macro.reset();
+        entry->isDefined = false;
+        entry->macro.body.reset();
     }
 }
 
 std::size_t MacroTable::slotOf(std::string_view name, std::uint32_t hash) const {
     const std::size_t mask = slots_.size() - 1;
     std::size_t at = hash & mask;
-    while (slots_[at].number != 0
-           && (slots_[at].hash != hash || names_[slots_[at].number - 1].text != name)) {
+    while (slots_[at].number != 0 && (slots_[at].hash != hash || nameIn(slots_[at]).text != name)) {
         at = (at + 1) & mask;
     }
     return at;
@@ -61,15 +82,23 @@ MacroName& MacroTable::enter(std::string_view name) {
     const std::uint32_t hash = hashOfName(name);
     std::size_t at = slotOf(name, hash);
     if (slots_[at].number == 0) {
-        if (2 * (names_.size() + 1) > slots_.size()) {
+        if (4 * (nameCount_ + 1) > 3 * slots_.size()) {
             grow();
             at = slotOf(name, hash);
         }
-        names_.push_back({{std::string(name), false}, nullptr});
-        slots_[at] = {hash, static_cast<std::uint32_t>(names_.size())};
+        if (nameCount_ % kNamesTogether == 0) {
+            names_.push_back(std::make_unique<Names>());
+        }
+        slots_[at] = {hash, static_cast<std::uint32_t>(++nameCount_)};
+        char* const bytes = newBytes(name.size());
+        nameIn(slots_[at]).text = {bytes, name.copy(bytes, name.size())};
         filter_.add(name);
     }
-    return names_[slots_[at].number - 1];
+    return nameIn(slots_[at]);
+}
+
+char* MacroTable::newBytes(std::size_t size) {
+    return static_cast<char*>(bytes_.allocate(size, 1));
 }
 
 void MacroTable::grow() {

@@ -2,10 +2,11 @@
 #ifndef UMPRE_MACROS_MACRO_TABLE_H
 #define UMPRE_MACROS_MACRO_TABLE_H
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
-#include <deque>
-#include <string>
+#include <memory>
+#include <memory_resource>
 #include <string_view>
 #include <vector>
 
@@ -23,7 +24,7 @@ public:
     enum class Definition { Added, Same, Replaced };
 
     /// Returns the entry of a defined name, otherwise null. It lives as long as the table; what it
-    /// points to changes with its definition.
+    /// says changes with its definition.
     [[nodiscard]] MacroName* find(std::string_view name);
 
     /// Enters an object-like macro with this text unless the name is defined.
@@ -31,7 +32,10 @@ public:
 
     /// Enters a definition. If the name is defined with the same text, that definition stays as it
     /// is; with another text, it is replaced.
-    Definition define(std::string_view name, Macro macro);
+    Definition define(std::string_view name, const MacroText& definition);
+
+    /// Replaces what a name is defined as. The views must not be of the name's own bytes.
+    void replace(MacroName& name, const MacroText& definition);
 
     /// Removes a name; does nothing if it is not defined.
     void undefine(std::string_view name);
@@ -45,12 +49,22 @@ private:
         std::uint32_t number = 0;  // of the name, counted from 1; 0: free
     };
 
+    static constexpr std::size_t kNamesTogether = 256;
+    using Names = std::array<MacroName, kNamesTogether>;
+
+    [[nodiscard]] MacroName& nameIn(Slot slot) const {
+        return (*names_[(slot.number - 1) / kNamesTogether])[(slot.number - 1) % kNamesTogether];
+    }
+
     [[nodiscard]] std::size_t slotOf(std::string_view name, std::uint32_t hash) const;
     [[nodiscard]] MacroName& enter(std::string_view name);
+    [[nodiscard]] char* newBytes(std::size_t size);
     void grow();
 
-    std::deque<MacroName> names_;
-    std::vector<Slot> slots_;  // open addressing; at most half of them are taken
+    std::pmr::monotonic_buffer_resource bytes_;  // of names and definitions
+    std::vector<std::unique_ptr<Names>> names_;
+    std::size_t nameCount_ = 0;
+    std::vector<Slot> slots_;  // open addressing; at most three of four are taken
     NameFilter filter_;
 };
 

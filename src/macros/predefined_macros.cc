@@ -3,7 +3,6 @@
 
 #include <array>
 #include <ctime>
-#include <memory>
 #include <string>
 
 namespace umpre {
@@ -39,7 +38,7 @@ void definePredefinedMacros(MacroTable& macros) {
     macros.defineMacro("__TIME__", time);
 }
 
-void refreshPredefined(MacroName& name, const SourcePosition& position) {
+void refreshPredefined(MacroTable& macros, MacroName& name, const SourcePosition& position) {
     if (name.text.size() != kRefreshedLength) {
         return;
     }
@@ -52,9 +51,9 @@ void refreshPredefined(MacroName& name, const SourcePosition& position) {
         return;
     }
     // The definition may be one of the source's own; only its text is replaced.
-    if (text != name.macro->text) {
-        name.macro = std::make_shared<const Macro>(std::move(text), name.macro->parameters,
-                                                   name.macro->functionLike);
+    if (text != name.macro.text()) {
+        const std::string parameters(name.macro.parameters());
+        macros.replace(name, {text, parameters, name.macro.functionLike()});
     }
 }
 

@@ -3,7 +3,6 @@
 #define UMPRE_MACROS_PREDEFINED_MACROS_H
 
 #include "lex/source_position.h"
-#include "macros/macro.h"
 #include "macros/macro_table.h"
 
 namespace umpre {
@@ -12,8 +11,8 @@ namespace umpre {
 /// now.
 void definePredefinedMacros(MacroTable& macros);
 
-/// Gives `__FILE__` and `__LINE__` their current text; leaves every other macro alone.
-void refreshPredefined(MacroName& name, const SourcePosition& position);
+/// Gives `__FILE__` and `__LINE__` their current text; leaves every other macro of the table alone.
+void refreshPredefined(MacroTable& macros, MacroName& name, const SourcePosition& position);
 
 }  // namespace umpre
 

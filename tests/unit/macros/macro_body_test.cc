@@ -7,6 +7,7 @@
 
 #include <gtest/gtest.h>
 
+#include "macros/macro_table.h"
 #include "support/lexeme.h"
 #include "support/recording_comment_sink.h"
 
@@ -52,10 +53,17 @@ using enum TokenKind;
     return {};
 }
 
+// Enters a definition and returns it.
+[[nodiscard]] const Macro& defined(MacroTable& macros, const MacroText& definition) {
+    macros.define("M", definition);
+    return macros.find("M")->macro;
+}
+
 // Returns the steps of a function-like macro's body in words; those that do nothing are left out.
 [[nodiscard]] std::string stepsOf(std::string_view text) {
     TextLexer lexer;
-    const Macro macro(std::string(text), {"x", "y"}, true);
+    MacroTable macros;
+    const Macro& macro = defined(macros, {text, "x,y", true});
     const std::shared_ptr<const MacroBody> body = bodyOf(macro, lexer);
     std::string steps;
     for (const BodyStep& step : body->steps) {
@@ -79,7 +87,8 @@ void expectSteps(const std::vector<Row>& table) {
 
 TEST(MacroBody, OfAnObjectLikeMacroIsItsTokens) {
     TextLexer lexer;
-    const Macro macro("a ## #x", {}, false);
+    MacroTable macros;
+    const Macro& macro = defined(macros, {"a ## #x", "", false});
     const std::shared_ptr<const MacroBody> body = bodyOf(macro, lexer);
     EXPECT_EQ(lexemesOf(body->tokens), (testing::Lexemes{{IDENTIFIER, "a"},
                                                          {WHITESPACE, " "},
@@ -92,7 +101,8 @@ TEST(MacroBody, OfAnObjectLikeMacroIsItsTokens) {
 
 TEST(MacroBody, IsMadeOnce) {
     TextLexer lexer;
-    const Macro macro("x", {"x"}, true);
+    MacroTable macros;
+    const Macro& macro = defined(macros, {"x", "x", true});
     EXPECT_EQ(macro.body, nullptr);
     const MacroBody* const body = bodyOf(macro, lexer).get();
     EXPECT_EQ(bodyOf(macro, lexer).get(), body);
@@ -211,7 +221,8 @@ TEST(MacroBody, MakesARunOfBlanksOneSpace) {
 
 TEST(MacroBody, HoldsDirectiveWordsAsNames) {
     TextLexer lexer;
-    const Macro macro("line if", {"line"}, true);
+    MacroTable macros;
+    const Macro& macro = defined(macros, {"line if", "line", true});
     const std::shared_ptr<const MacroBody> body = bodyOf(macro, lexer);
     ASSERT_EQ(body->steps.size(), 2U);
     EXPECT_EQ(describe(*body, body->steps[0]), "argument 0");
@@ -220,7 +231,8 @@ TEST(MacroBody, HoldsDirectiveWordsAsNames) {
 
 TEST(MacroBody, OfTwoParametersWithOneNameTakesTheLast) {
     TextLexer lexer;
-    const Macro macro("x # x x ## x", {"x", "x"}, true);
+    MacroTable macros;
+    const Macro& macro = defined(macros, {"x # x x ## x", "x,x", true});
     const std::shared_ptr<const MacroBody> body = bodyOf(macro, lexer);
     ASSERT_EQ(body->steps.size(), 5U);
     EXPECT_EQ(describe(*body, body->steps[0]), "argument 1");
@@ -241,9 +253,10 @@ TEST(MacroBody, CarriesOutTheEffectsOfACommentWhereItIsRead) {
 
 TEST(MacroBody, KeepsTheSourceOnlyIfReadingItHasEffects) {
     TextLexer lexer;
-    const Macro plain("a /* b */ x", {"x"}, true);
+    MacroTable macros;
+    const Macro& plain = defined(macros, {"a /* b */ x", "x", true});
     EXPECT_EQ(bodyOf(plain, lexer)->source.size(), 0U);
-    const Macro withEffects("a /*\n*/ x", {"x"}, true);
+    const Macro& withEffects = defined(macros, {"a /*\n*/ x", "x", true});
     EXPECT_TRUE(bodyOf(withEffects, lexer)->source.hasEffects());
 }
 

@@ -1,10 +1,8 @@
 // SPDX-License-Identifier: MIT
 #include "macros/macro_table.h"
 
-#include <memory>
 #include <string>
 #include <string_view>
-#include <vector>
 
 #include <gtest/gtest.h>
 
@@ -14,18 +12,18 @@ namespace {
 using std::string_view_literals::operator""sv;
 using Definition = MacroTable::Definition;
 
-[[nodiscard]] Macro objectLike(std::string text) {
-    return {std::move(text), {}, false};
+[[nodiscard]] MacroText objectLike(std::string_view text) {
+    return {text, {}, false};
 }
 
-[[nodiscard]] Macro functionLike(std::string text, std::vector<std::string> parameters) {
-    return {std::move(text), std::move(parameters), true};
+[[nodiscard]] MacroText functionLike(std::string_view text, std::string_view parameters) {
+    return {text, parameters, true};
 }
 
 // Returns a defined name's text, or nothing.
 [[nodiscard]] std::string textOf(MacroTable& macros, std::string_view name) {
     const MacroName* const found = macros.find(name);
-    return found == nullptr ? "(not defined)" : found->macro->text;
+    return std::string(found == nullptr ? "(not defined)" : found->macro.text());
 }
 
 TEST(MacroTable, FindsNothingAtFirst) {
@@ -40,22 +38,23 @@ TEST(MacroTable, FindsWhatWasDefined) {
     const MacroName* const found = macros.find("A");
     ASSERT_NE(found, nullptr);
     EXPECT_EQ(found->text, "A");
-    EXPECT_EQ(found->macro->text, "1");
-    EXPECT_FALSE(found->macro->functionLike);
+    EXPECT_EQ(found->macro.text(), "1");
+    EXPECT_FALSE(found->macro.functionLike());
 }
 
 TEST(MacroTable, KeepsParametersInTheirOrder) {
     MacroTable macros;
-    macros.define("F", functionLike("x", {"b", "a", "b"}));
-    EXPECT_EQ(macros.find("F")->macro->parameters, (std::vector<std::string>{"b", "a", "b"}));
-    EXPECT_TRUE(macros.find("F")->macro->functionLike);
+    macros.define("F", functionLike("x", "b,a,b"));
+    EXPECT_EQ(macros.find("F")->macro.parameters(), "b,a,b");
+    EXPECT_EQ(macros.find("F")->macro.parameterCount(), 3);
+    EXPECT_TRUE(macros.find("F")->macro.functionLike());
 }
 
 TEST(MacroTable, AFunctionLikeMacroMayHaveNoParameters) {
     MacroTable macros;
-    macros.define("F", functionLike("1", {}));
-    EXPECT_TRUE(macros.find("F")->macro->functionLike);
-    EXPECT_TRUE(macros.find("F")->macro->parameters.empty());
+    macros.define("F", functionLike("1", ""));
+    EXPECT_TRUE(macros.find("F")->macro.functionLike());
+    EXPECT_EQ(macros.find("F")->macro.parameterCount(), 0);
 }
 
 TEST(MacroTable, NamesAreBytes) {
@@ -75,19 +74,19 @@ TEST(MacroTable, NamesAreBytes) {
 
 TEST(MacroTable, TheSameTextChangesNothing) {
     MacroTable macros;
-    macros.define("F", functionLike("x", {"x"}));
+    macros.define("F", functionLike("x", "x"));
     EXPECT_EQ(macros.define("F", objectLike("x")), Definition::Same);
-    EXPECT_TRUE(macros.find("F")->macro->functionLike);
-    EXPECT_EQ(macros.find("F")->macro->parameters, std::vector<std::string>{"x"});
+    EXPECT_TRUE(macros.find("F")->macro.functionLike());
+    EXPECT_EQ(macros.find("F")->macro.parameters(), "x");
 }
 
 TEST(MacroTable, AnotherTextReplacesTheWholeDefinition) {
     MacroTable macros;
-    macros.define("F", functionLike("x", {"x"}));
+    macros.define("F", functionLike("x", "x"));
     EXPECT_EQ(macros.define("F", objectLike("y")), Definition::Replaced);
     EXPECT_EQ(textOf(macros, "F"), "y");
-    EXPECT_FALSE(macros.find("F")->macro->functionLike);
-    EXPECT_TRUE(macros.find("F")->macro->parameters.empty());
+    EXPECT_FALSE(macros.find("F")->macro.functionLike());
+    EXPECT_EQ(macros.find("F")->macro.parameterCount(), 0);
 }
 
 TEST(MacroTable, DefineMacroKeepsWhatIsDefined) {
@@ -101,7 +100,7 @@ TEST(MacroTable, DefineMacroTakesTheTextAsItIs) {
     MacroTable macros;
     macros.defineMacro("A", "  x   y ");
     EXPECT_EQ(textOf(macros, "A"), "  x   y ");
-    EXPECT_FALSE(macros.find("A")->macro->functionLike);
+    EXPECT_FALSE(macros.find("A")->macro.functionLike());
 }
 
 TEST(MacroTable, AnUndefinedNameIsNotFound) {
@@ -144,16 +143,33 @@ TEST(MacroTable, AnEntryStaysWhereItIs) {
     macros.define("A", objectLike("2"));
     EXPECT_EQ(macros.find("A"), entry);
     EXPECT_EQ(entry->text, "A");
-    EXPECT_EQ(entry->macro->text, "2");
+    EXPECT_EQ(entry->macro.text(), "2");
 }
 
-TEST(MacroTable, ADefinitionOutlivesItsNameWhereItIsHeld) {
+TEST(MacroTable, ANameIsDefinedAnewInItsOwnBytes) {
+    MacroTable macros;
+    macros.define("A", functionLike("0123456789", "a,b"));
+    const char* const bytes = macros.find("A")->macro.parameters().data();
+    for (const std::string text : {"1", "", "9876543210abc", "a"}) {
+        macros.undefine("A");
+        EXPECT_EQ(macros.define("A", objectLike(text)), Definition::Added);
+        EXPECT_EQ(textOf(macros, "A"), text);
+        EXPECT_EQ(macros.find("A")->macro.text().data(), bytes);
+    }
+    EXPECT_EQ(macros.define("A", objectLike("0123456789abcd")), Definition::Replaced);
+    EXPECT_EQ(textOf(macros, "A"), "0123456789abcd");
+}
+
+TEST(MacroTable, DefinitionsDoNotTouchEachOther) {
     MacroTable macros;
     macros.define("A", objectLike("1"));
-    const std::shared_ptr<const Macro> held = macros.find("A")->macro;
-    macros.define("A", objectLike("2"));
-    macros.undefine("A");
-    EXPECT_EQ(held->text, "1");
+    macros.define("F", functionLike("x", "x"));
+    macros.define("A", objectLike("a longer one"));
+    macros.define("B", objectLike("2"));
+    EXPECT_EQ(textOf(macros, "A"), "a longer one");
+    EXPECT_EQ(textOf(macros, "F"), "x");
+    EXPECT_EQ(macros.find("F")->macro.parameters(), "x");
+    EXPECT_EQ(textOf(macros, "B"), "2");
 }
 
 TEST(MacroTable, HoldsThousandsOfNames) {

@@ -2,6 +2,7 @@
 #ifndef UMPRE_TESTS_UNIT_SUPPORT_DIRECTIVE_FIXTURE_H
 #define UMPRE_TESTS_UNIT_SUPPORT_DIRECTIVE_FIXTURE_H
 
+#include <string>
 #include <string_view>
 
 #include "lex/token.h"
@@ -24,7 +25,7 @@ struct DirectiveFixture : MacroFixture {
     /// Returns a defined name's text, or a text that says that there is none.
     [[nodiscard]] std::string definition(std::string_view name) {
         const MacroName* const found = macros.find(name);
-        return found == nullptr ? "(not defined)" : found->macro->text;
+        return std::string(found == nullptr ? "(not defined)" : found->macro.text());
     }
 };
 

@@ -27,12 +27,16 @@ struct MacroFixture : SourceFixture {
 
     /// Enters an object-like macro.
     void define(std::string_view name, std::string_view text) {
-        macros.define(name, Macro(std::string(text), {}, false));
+        macros.define(name, {text, {}, false});
     }
 
     /// Enters a function-like macro.
     void define(const Definition& definition) {
-        macros.define(definition.name, Macro(definition.text, definition.parameters, true));
+        std::string parameters;
+        for (const std::string& parameter : definition.parameters) {
+            parameters.append(parameters.empty() ? "" : ",").append(parameter);
+        }
+        macros.define(definition.name, {definition.text, parameters, true});
     }
 
     void define(const std::vector<Definition>& definitions) {
