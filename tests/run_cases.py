@@ -23,6 +23,7 @@ import tempfile
 
 ROOT = pathlib.Path(__file__).resolve().parent.parent
 LIMIT = 20
+PROGRAMS = ["umpre", "umpre-lines", "umpre-deps"]
 ORDER = ["run", "file", "input", "output", "errors", "written", "status"]
 HEADER = re.compile(r"(run|status): \S.*|(file|written) \S.*:|(input|output|errors):")
 MARK = re.compile(r"<(SP|TAB|VT|FF|CR|NUL|LT|END|ANY|x[0-9A-F]{2})>")
@@ -31,6 +32,18 @@ BYTES = {"SP": " ", "TAB": "\t", "VT": "\v", "FF": "\f", "CR": "\r", "NUL": "\0"
 MARKS = {byte: f"<{mark}>" for mark, byte in BYTES.items()}
 # The lines of a case stand in the file `path`, after `start` others.
 Case = collections.namedtuple("Case", "name path start lines")
+
+
+def programOf(case):
+    """Returns the program that a case runs; nothing if it is not exactly one."""
+    runs = [line for line in case.lines if line.startswith("run: ")]
+    return shlex.split(runs[0])[1] if len(runs) == 1 else None
+
+
+def pathFor(case, umpre):
+    """Returns where the program is that a case runs: others than umpre lie beside it."""
+    name = programOf(case)
+    return umpre if name == "umpre" else os.path.join(os.path.dirname(umpre), name)
 
 
 def parse(case):
@@ -50,8 +63,8 @@ def parse(case):
             raise ValueError(where + "neither a new section nor a bar, a blank and visible text")
     if case.path.suffix == ".case" and not "".join(title):
         raise ValueError("a case opens with a title")
-    if [shlex.split(header)[1] for header in sections if header.startswith("run")] != ["umpre"]:
-        raise ValueError("a case has one line `run: umpre ...`")
+    if programOf(case) not in PROGRAMS:
+        raise ValueError("a case has one line `run: umpre ...`, or of a program beside it")
     return "\n".join(title).strip(), sections
 
 
@@ -137,7 +150,7 @@ def run(case, command):
     """Returns how a case differs from what happened, and the lines that would say what did."""
     try:
         title, sections = parse(case)
-        result = outcome(sections, command)
+        result = outcome(sections, [*command[:-1], pathFor(case, command[-1])])
     except ValueError as why:
         return f"--- {case.name}\n{why}\n", None
     before, after = (sum(textOf(part), []) for part in (sections, result))
@@ -178,6 +191,9 @@ def main():
     command = shlex.split(options.under) + [os.path.abspath(options.umpre)]
     if not os.access(command[-1], os.X_OK):
         sys.exit(f"run_cases.py: there is no program {command[-1]}")
+    # A build need not have all the programs.
+    cases = [case for case in cases if programOf(case) not in PROGRAMS
+             or os.access(pathFor(case, command[-1]), os.X_OK)]
     resource.setrlimit(resource.RLIMIT_CORE, (0, 0))  # a core would be one more file
     failed = 0
     with concurrent.futures.ThreadPoolExecutor(options.jobs) as pool:

@@ -49,8 +49,7 @@ bool printTexts(const OptionParser& options, ByteSink& output) {
     }
     if (options.has("v") || options.has("-version")) {
         options.reportIgnored(kIgnored);
-        (void)output.write(std::string("umpre version ") + UmGetVersionString() + "\n"
-                           + UmGetCopyrightString() + "\n");
+        (void)output.write(versionTextOf("umpre"));
         return true;
     }
     return false;

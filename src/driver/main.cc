@@ -1,11 +1,11 @@
 // SPDX-License-Identifier: MIT
 #include <csignal>
-#include <fcntl.h>
 #include <unistd.h>
 
 #include "driver/command_line.h"
 #include "driver/output_file.h"
 #include "driver/preprocessor.h"
+#include "driver/standard_descriptors.h"
 
 #ifndef UMPRE_PLAIN_ROAD
 #define UMPRE_PLAIN_ROAD false
@@ -14,16 +14,6 @@
 namespace {
 
 enum Status { kClean = 0, kErrors = 1, kScannerFailure = 2 };
-
-// A standard descriptor that is closed would be given to the next file opened. Standard output gets
-// one that cannot be written, so that what is lost is noticed.
-void openStandardDescriptors() {
-    for (int descriptor = STDIN_FILENO; descriptor <= STDERR_FILENO; ++descriptor) {
-        if (::fcntl(descriptor, F_GETFD) == -1) {
-            (void)::open("/dev/null", descriptor == STDOUT_FILENO ? O_RDONLY : O_RDWR);
-        }
-    }
-}
 
 // Ends the process as a failing machine division does, on every machine.
 void raiseArithmeticFault() {
@@ -38,7 +28,7 @@ void raiseArithmeticFault() {
 }  // namespace
 
 int main(int argc, char** argv) {
-    openStandardDescriptors();
+    umpre::openStandardDescriptors();
     umpre::DescriptorSink errors(STDERR_FILENO);
     umpre::OutputFile output;
     umpre::RunOptions options;

@@ -34,8 +34,9 @@ bool OutputFile::close() {
 }
 
 std::string OutputFile::failureMessage() const {
-    return name_.empty() ? "umpre: cannot write to standard output\n"
-                         : "umpre: cannot write output file '" + name_ + "'\n";
+    const std::string program(program_);
+    return name_.empty() ? program + ": cannot write to standard output\n"
+                         : program + ": cannot write output file '" + name_ + "'\n";
 }
 
 }  // namespace umpre

@@ -13,7 +13,9 @@ namespace umpre {
 /// Where the result goes: standard output, or the file that took its place.
 class OutputFile final : public ByteSink {
 public:
-    OutputFile() = default;
+    /// The name of the program stands in front of its message.
+    explicit OutputFile(std::string_view program = "umpre") noexcept : program_(program) {}
+
     OutputFile(const OutputFile&) = delete;
     OutputFile& operator=(const OutputFile&) = delete;
     ~OutputFile() override;
@@ -28,6 +30,7 @@ public:
     [[nodiscard]] std::string failureMessage() const;
 
 private:
+    std::string_view program_;
     int descriptor_ = STDOUT_FILENO;
     std::string name_;  // empty: standard output
     bool failed_ = false;

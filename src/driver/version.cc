@@ -40,3 +40,8 @@ const char* UmGetLibNameAndVersionString() {
 const char* UmGetCopyrightString() {
     return "Copyright (c) 2026 The umpre developers.";
 }
+
+std::string umpre::versionTextOf(std::string_view program) {
+    return std::string(program) + " version " + UmGetVersionString() + "\n" + UmGetCopyrightString()
+           + "\n";
+}

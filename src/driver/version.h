@@ -2,6 +2,9 @@
 #ifndef UMPRE_DRIVER_VERSION_H
 #define UMPRE_DRIVER_VERSION_H
 
+#include <string>
+#include <string_view>
+
 // Exported by name from the executable. Each returns a text that stays valid for the life of the
 // process; the first call of each must not race with another.
 extern "C" {
@@ -13,5 +16,12 @@ __attribute__((visibility("default"))) const char* UmGetLibNameAndVersionString(
 /// Returns the copyright line.
 __attribute__((visibility("default"))) const char* UmGetCopyrightString();
 }
+
+namespace umpre {
+
+/// Returns what a program of the project says when it is asked for its version.
+[[nodiscard]] std::string versionTextOf(std::string_view program);
+
+}  // namespace umpre
 
 #endif
