@@ -19,6 +19,8 @@
 #include <cstdint>
 #include <string_view>
 
+#include "lex/spelling.h"
+
 namespace umpre {
 namespace {
 
@@ -56,57 +58,7 @@ constexpr std::array<Class, 256> kClasses = [] {
     return kClasses[static_cast<unsigned char>(byte)];
 }
 
-[[nodiscard]] bool isDigit(char byte) noexcept {
-    return classOf(byte) == Class::Digit;
-}
-
-[[nodiscard]] bool isHexDigit(char byte) noexcept {
-    const char lower = static_cast<char>(byte | 0x20);
-    return isDigit(byte) || (lower >= 'a' && lower <= 'f');
-}
-
 // The functions below read up to two bytes behind the text; zero bytes stand there.
-
-[[nodiscard]] const char* nameEnd(const char* at) noexcept {
-    while (classOf(*at) == Class::Name || isDigit(*at)) {
-        ++at;
-    }
-    return at;
-}
-
-[[nodiscard]] bool isEither(char byte, char lower) noexcept {
-    return (byte | 0x20) == lower;
-}
-
-// Returns the end of the suffix that may stand at `at`: "u" or "l" or one of each, in any case.
-[[nodiscard]] const char* suffixEnd(const char* at) noexcept {
-    if (isEither(*at, 'u')) {
-        return isEither(at[1], 'l') ? at + 2 : at + 1;
-    }
-    if (isEither(*at, 'l')) {
-        return isEither(at[1], 'u') ? at + 2 : at + 1;
-    }
-    return at;
-}
-
-// Returns the end of the number that begins at `at`, as the number rules split it.
-[[nodiscard]] const char* numberEnd(const char* at) noexcept {
-    if (*at != '0') {
-        while (isDigit(*at)) {
-            ++at;
-        }
-    } else if (isEither(at[1], 'x') && isHexDigit(at[2])) {
-        at += 2;
-        while (isHexDigit(*at)) {
-            ++at;
-        }
-    } else {
-        while (*at >= '0' && *at <= '7') {
-            ++at;
-        }
-    }
-    return suffixEnd(at);
-}
 
 // Tells whether a comment or a continuation begins at `at`.
 [[nodiscard]] bool isSpecial(const char* at) noexcept {
@@ -140,7 +92,7 @@ template <typename MustStop>
             at = next;
             break;
         }
-        case Class::Digit: at = numberEnd(at); break;
+        case Class::Digit: at += numberAt(at).text.size(); break;
         case Class::Quote: at += std::max<std::size_t>(file.literalSize(at), 1); break;
         case Class::Slash:
         case Class::Backslash:

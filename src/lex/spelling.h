@@ -1,0 +1,39 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_LEX_SPELLING_H
+#define UMPRE_LEX_SPELLING_H
+
+#include <string_view>
+
+#include "lex/token.h"
+
+namespace umpre {
+
+// How names and numbers are spelled, for readers of bytes. Each function reads up to the first byte
+// that does not belong to what it reads.
+
+[[nodiscard]] constexpr bool isDigit(char byte) noexcept {
+    return byte >= '0' && byte <= '9';
+}
+
+[[nodiscard]] constexpr bool isNameStart(char byte) noexcept {
+    const char lower = static_cast<char>(byte | 0x20);
+    return (lower >= 'a' && lower <= 'z') || byte == '_';
+}
+
+/// Returns the end of a name that begins at `at`, or of the rest of one.
+[[nodiscard]] inline const char* nameEnd(const char* at) noexcept {
+    while (isNameStart(*at) || isDigit(*at)) {
+        ++at;
+    }
+    return at;
+}
+
+/// Returns the kind of a name: that of a directive word or of `defined`, or IDENTIFIER.
+[[nodiscard]] TokenKind kindOfName(std::string_view name) noexcept;
+
+/// Returns the number that begins at `at` with a digit, as the number rules split it.
+[[nodiscard]] Token numberAt(const char* at) noexcept;
+
+}  // namespace umpre
+
+#endif
