@@ -37,7 +37,8 @@ void Diagnostics::noteUnterminatedComment(std::int32_t line) {
 }
 
 void Diagnostics::noteScannerFailure(std::string_view message) {
-    (void)sink_.write(std::string(message) + "\n");
+    // Not joined first: there may be no memory for that.
+    (void)(sink_.write(message) && sink_.write("\n"));
 }
 
 }  // namespace umpre

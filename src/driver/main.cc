@@ -1,11 +1,14 @@
 // SPDX-License-Identifier: MIT
 #include <csignal>
+#include <exception>
+#include <new>
 #include <unistd.h>
 
 #include "driver/command_line.h"
 #include "driver/output_file.h"
 #include "driver/preprocessor.h"
 #include "driver/standard_descriptors.h"
+#include "lex/scanner_failure.h"
 
 #ifndef UMPRE_PLAIN_ROAD
 #define UMPRE_PLAIN_ROAD false
@@ -25,10 +28,18 @@ void raiseArithmeticFault() {
     (void)std::raise(SIGFPE);
 }
 
-}  // namespace
+int reportNoMemory() {
+    umpre::DescriptorSink errors(STDERR_FILENO);
+    (void)(errors.write(umpre::kNoMemory) && errors.write("\n"));
+    return kScannerFailure;
+}
 
-int main(int argc, char** argv) {
-    umpre::openStandardDescriptors();
+// Called where there is not even the memory to throw an exception.
+[[noreturn]] void endWithoutMemory() {
+    ::_exit(reportNoMemory());
+}
+
+int preprocess(int argc, char** argv) {
     umpre::DescriptorSink errors(STDERR_FILENO);
     umpre::OutputFile output;
     umpre::RunOptions options;
@@ -49,4 +60,16 @@ int main(int argc, char** argv) {
         return kScannerFailure;
     }
     return isWritten && result == umpre::RunResult::Clean ? kClean : kErrors;
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    std::set_terminate(endWithoutMemory);
+    umpre::openStandardDescriptors();
+    try {
+        return preprocess(argc, argv);
+    } catch (const std::bad_alloc&) {
+        return reportNoMemory();
+    }
 }

@@ -45,7 +45,7 @@ RunResult Preprocessor::run() {
         diagnostics_.noteScannerFailure(failure.message);
         result = RunResult::ScannerFailure;
     } catch (const std::bad_alloc&) {
-        diagnostics_.noteScannerFailure("out of dynamic memory in yy_create_buffer()");
+        diagnostics_.noteScannerFailure(kNoMemory);
         result = RunResult::ScannerFailure;
     } catch (const ArithmeticFault&) {
         result = RunResult::ArithmeticFault;
