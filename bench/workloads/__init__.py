@@ -4,6 +4,7 @@
 from .files import distinct, includes, reinclude
 from .hostile import hostile
 from .macros import bigmacro, defines, functions, objects
+from .real import real
 from .text import comments, conditions, data, oneline, plain, skipped
 
 # In the order of the table. Each is called with the folder to write to, a random generator and the
@@ -24,6 +25,7 @@ WORKLOADS = {
         defines,
         functions,
         bigmacro,
+        real,
         hostile,
     )
 }
