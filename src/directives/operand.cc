@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "directives/operand.h"
 
-#include "lex/pieces.h"
+#include "lex/shared_text.h"
 
 namespace umpre {
 
@@ -28,10 +28,7 @@ std::string gatherUncontinuedLine(ScannerStack& sources) {
 ExpandedOperand::ExpandedOperand(ScannerStack& sources, MacroExpander& expander, TextLexer& lexer,
                                  std::string_view text, LineKind kind)
     : sources_(sources) {
-    Pieces pieces;
-    lexer.append(pieces.open(), expander.expandLine(text, kind));
-    pieces.close({});
-    sources_.isolate(pieces);
+    sources_.isolate(TextSlice::whole(lexer.lexed(expander.expandLine(text, kind))), {});
 }
 
 }  // namespace umpre

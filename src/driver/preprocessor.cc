@@ -13,9 +13,9 @@ using enum TokenKind;
 
 Preprocessor::Preprocessor(ByteSink& errors, const RunOptions& options)
     : options_(options),
+      lexer_(options),
       sources_(*this, output_, diagnostics_, options),
       diagnostics_(errors, sources_),
-      lexer_(options),
       expander_(sources_, macros_, diagnostics_, lexer_),
       conditionals_(sources_, macros_, expander_, lexer_, diagnostics_),
       definitions_(sources_, macros_, diagnostics_),
@@ -158,6 +158,11 @@ void Preprocessor::restOfTextLine() {
                    == TextReader::Stop::LineStart) {
             return;
         }
+        const std::string_view text = expander_.takeText();
+        if (!text.empty()) {
+            output_.write(text);
+            continue;
+        }
         const Token token = sources_.next();
         if (token.kind == END_OF_INPUT) {
             return;
@@ -171,7 +176,7 @@ void Preprocessor::restOfTextLine() {
 }
 
 void Preprocessor::writeToken(const Token& token) {
-    output_.write(isName(token.kind) ? expander_.expandName(token.text) : token.text);
+    output_.write(isName(token.kind) ? expander_.expandName(token) : token.text);
 }
 
 void Preprocessor::endSkippedLine() {

@@ -79,10 +79,10 @@ private:
 
     RunOptions options_;
     OutputWriter output_;
+    TextLexer lexer_;  // its texts are held by sources and macros
     ScannerStack sources_;
     Diagnostics diagnostics_;
     MacroTable macros_;
-    TextLexer lexer_;
     MacroExpander expander_;
     Conditionals conditionals_;
     Definitions definitions_;

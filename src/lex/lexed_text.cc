@@ -10,6 +10,7 @@ void LexedText::clear() {
     text_.clear();
     tokens_.clear();
     effects_.clear();
+    outline_.reset();
 }
 
 void LexedText::append(const LexedText& other, std::size_t first, std::size_t last) {
@@ -17,12 +18,15 @@ void LexedText::append(const LexedText& other, std::size_t first, std::size_t la
     if (first == last) {
         return;
     }
-    const std::size_t begin = other.beginOf(first);
-    const std::size_t shift = text_.size() - begin;  // may wrap; adding it wraps back
-    text_.append(other.text_, begin, other.tokens_[last - 1].end() - begin);
-    for (std::size_t index = first; index < last; ++index) {
-        const Entry& entry = other.tokens_[index];
-        tokens_.emplace_back(entry.kind(), entry.end() + shift);
+    const std::size_t shift = text_.size() - other.beginOf(first);  // may wrap
+    text_.append(other.joined(first, last));
+    const std::size_t before = tokens_.size();
+    const auto from = [&other](std::size_t index) {
+        return other.tokens_.begin() + static_cast<std::ptrdiff_t>(index);
+    };
+    tokens_.insert(tokens_.end(), from(first), from(last));
+    for (std::size_t index = before; index < tokens_.size(); ++index) {
+        tokens_[index].shift(shift);
     }
 }
 

@@ -4,14 +4,18 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <vector>
 
 #include "lex/comment_sink.h"
+#include "lex/no_expand_set.h"
 #include "lex/token.h"
 
 namespace umpre {
+
+struct TextOutline;
 
 /// Tokens kept for reading, with the effects that reading them has: a comment's line ends and the
 /// note that one is not closed happen each time its token is read. Tokens keep their bounds; two
@@ -20,10 +24,10 @@ class LexedText {
 public:
     void clear();
 
-    /// Adds a token of a known kind.
-    void append(TokenKind kind, std::string_view text) {
+    /// Adds a token of a known kind. `name` is the entry of a name, if it is known.
+    void append(TokenKind kind, std::string_view text, Name* name = nullptr) {
         text_.append(text);
-        tokens_.emplace_back(kind, text_.size());
+        tokens_.emplace_back(kind, text_.size(), name);
     }
 
     /// Adds tokens `first` up to, not including, `last` of another text, which has no effects.
@@ -31,19 +35,37 @@ public:
     /// Adds an effect of reading the token that will be added next.
     void addCommentEffect(std::size_t lineEnds, bool unterminated, std::int32_t line);
 
+    /// Notes the entry of a token that is a name.
+    void setName(std::size_t index, Name* name) noexcept { tokens_[index].setName(name); }
+
     [[nodiscard]] std::size_t size() const noexcept { return tokens_.size(); }
 
     [[nodiscard]] TokenKind kind(std::size_t index) const noexcept { return tokens_[index].kind(); }
 
     [[nodiscard]] std::string_view text(std::size_t index) const noexcept {
-        const std::size_t begin = beginOf(index);
-        return {text_.data() + begin, tokens_[index].end() - begin};
+        return joined(index, index + 1);
+    }
+
+    /// Returns the entry of a name; null if it is not known, and for all other tokens.
+    [[nodiscard]] Name* name(std::size_t index) const noexcept { return tokens_[index].name(); }
+
+    [[nodiscard]] Token token(std::size_t index) const noexcept {
+        return {kind(index), text(index), name(index)};
     }
 
     /// Returns the texts of all tokens, joined.
     [[nodiscard]] const std::string& joined() const noexcept { return text_; }
 
+    /// Returns the texts of tokens `first` up to, not including, `last`, joined.
+    [[nodiscard]] std::string_view joined(std::size_t first, std::size_t last) const noexcept {
+        const std::size_t begin = beginOf(first);
+        return {text_.data() + begin, beginOf(last) - begin};
+    }
+
     [[nodiscard]] bool hasEffects() const noexcept { return !effects_.empty(); }
+
+    /// Returns the outline of a text to which nothing more is added, made at the first call.
+    [[nodiscard]] const TextOutline& outline() const;
 
     /// Carries out what reading the token at `index` does beside yielding it.
     void carryOutEffects(std::size_t index, CommentSink& sink) const;
@@ -53,8 +75,8 @@ private:
     // word holds both: long bodies and arguments are mostly these.
     class Entry {
     public:
-        Entry(TokenKind kind, std::size_t end) noexcept
-            : bits_(end << kKindBits | static_cast<std::uint64_t>(kind)) {}
+        Entry(TokenKind kind, std::size_t end, Name* name) noexcept
+            : bits_(end << kKindBits | static_cast<std::uint64_t>(kind)), name_(name) {}
 
         [[nodiscard]] TokenKind kind() const noexcept {
             return static_cast<TokenKind>(bits_ & ((1U << kKindBits) - 1));
@@ -62,9 +84,17 @@ private:
 
         [[nodiscard]] std::size_t end() const noexcept { return bits_ >> kKindBits; }
 
+        /// Moves the end; a shift that is negative wraps.
+        void shift(std::size_t by) noexcept { bits_ += by << kKindBits; }
+
+        [[nodiscard]] Name* name() const noexcept { return name_; }
+
+        void setName(Name* name) noexcept { name_ = name; }
+
     private:
         static constexpr unsigned kKindBits = 16;
         std::uint64_t bits_;
+        Name* name_;
     };
 
     struct Effect {
@@ -81,6 +111,7 @@ private:
     std::string text_;
     std::vector<Entry> tokens_;
     std::vector<Effect> effects_;  // in the order of the tokens
+    mutable std::shared_ptr<const TextOutline> outline_;
 };
 
 }  // namespace umpre

@@ -59,9 +59,14 @@ std::size_t NoExpandSets::KeyHash::operator()(const Key& key) const noexcept {
 }
 
 NoExpandSet NoExpandSets::with(NoExpandSet set, const Name& name) {
-    if (contains(set, name)) {
-        return set;
+    if (name.extension == NoExpandSet() || name.extended != set) {
+        name.extended = set;
+        name.extension = contains(set, name) ? set : extend(set, name);
     }
+    return name.extension;
+}
+
+NoExpandSet NoExpandSets::extend(NoExpandSet set, const Name& name) {
     const Node* const rest = set.node_;
     if (rest != nullptr && rest->size >= kSmall) {
         return NoExpandSet(add(rest, name));
@@ -88,16 +93,19 @@ NoExpandSet NoExpandSets::united(NoExpandSet set, NoExpandSet other) {
         return other;
     }
     const Key key{set.node_, other.node_};
-    const auto known = unions_.find(key);
-    if (known != unions_.end()) {
-        return known->second;
+    if (lastUnited_ != key) {
+        const auto [entry, isNew] = unions_.try_emplace(key, set);
+        if (isNew) {
+            NoExpandSet result = set;
+            for (const Node* node = other.node_; node != nullptr; node = node->rest) {
+                result = with(result, *node->name);
+            }
+            entry->second = result;
+        }
+        lastUnited_ = key;
+        lastUnion_ = entry->second;
     }
-    NoExpandSet result = set;
-    for (const Node* node = other.node_; node != nullptr; node = node->rest) {
-        result = with(result, *node->name);
-    }
-    unions_.emplace(key, result);
-    return result;
+    return lastUnion_;
 }
 
 }  // namespace umpre

@@ -12,13 +12,7 @@
 
 namespace umpre {
 
-/// A macro's name. There is one such object for each spelling, so its address says which name it
-/// is.
-struct Name {
-    std::string_view text;
-    bool isDefined = false;         ///< there is a macro of this name now
-    mutable bool isMarked = false;  ///< by NoExpandSets, which looks into large sets that way
-};
+struct Name;
 
 /// An immutable set of macro names, a value as small as a pointer. Sets share their nodes: a set is
 /// another set and one name more.
@@ -48,6 +42,17 @@ private:
     }
 
     const Node* node_ = nullptr;
+};
+
+/// A name that is or was a macro's, or that may become one. There is one such object for each
+/// spelling, so its address says which name it is.
+struct Name {
+    std::string_view text;
+    bool isDefined = false;         ///< there is a macro of this name now
+    mutable bool isMarked = false;  ///< by NoExpandSets, which looks into large sets that way
+    // Which set the name was last added to, and what that gave.
+    mutable NoExpandSet extended;
+    mutable NoExpandSet extension;
 };
 
 /// Makes and owns the sets of a run. Small sets made by adding the same names in the same order are
@@ -81,11 +86,14 @@ private:
 
     [[nodiscard]] bool holds(const Node& set, const Name& name);
     void mark(const Node& set);
+    [[nodiscard]] NoExpandSet extend(NoExpandSet set, const Name& name);
     [[nodiscard]] const Node* add(const Node* rest, const Name& name);
 
     std::deque<Node> nodes_;
     std::unordered_map<Key, const Node*, KeyHash> extended_;  // (set, name) to set
     std::unordered_map<Key, NoExpandSet, KeyHash> unions_;    // (set, set) to set
+    Key lastUnited_{nullptr, nullptr};
+    NoExpandSet lastUnion_;
     const Node* marked_ = nullptr;                            // the set whose names are marked
     std::vector<const Node*> path_;
 };

@@ -4,10 +4,12 @@
 
 #include <cstddef>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "lex/lexed_text.h"
 #include "lex/no_expand_set.h"
+#include "lex/shared_text.h"
 
 namespace umpre {
 
@@ -22,41 +24,60 @@ public:
         NoExpandSet noExpand;
     };
 
-    void clear() {
-        tokens_.clear();
+    Pieces() = default;
+
+    /// Builds on a text that is empty.
+    explicit Pieces(SharedText text) : text_(std::move(text)) {}
+
+    /// Begins anew with a text that is empty; without one, lets go of what there was.
+    void restart(SharedText text = {}) {
+        text_ = std::move(text);
         runs_.clear();
     }
 
     /// Adds one token.
-    void append(TokenKind kind, std::string_view text, NoExpandSet noExpand) {
-        tokens_.append(kind, text);
+    void append(const Token& token, NoExpandSet noExpand) {
+        open().append(token.kind, token.text, token.name);
         close(noExpand);
     }
 
     /// Adds tokens `first` up to, not including, `last` of a text.
     void append(const LexedText& text, std::size_t first, std::size_t last, NoExpandSet noExpand) {
-        tokens_.append(text, first, last);
+        open().append(text, first, last);
         close(noExpand);
     }
 
     /// Gives access for adding tokens, which `close` then makes a piece.
-    [[nodiscard]] LexedText& open() noexcept { return tokens_; }
+    [[nodiscard]] LexedText& open() {
+        if (!text_) {
+            text_ = SharedText::alone();
+        }
+        return text_.edit();
+    }
 
     /// Gives the tokens added since the last piece their set.
     void close(NoExpandSet noExpand) {
+        const std::size_t end = open().size();
         if (!runs_.empty() && runs_.back().noExpand == noExpand) {
-            runs_.back().end = tokens_.size();
+            runs_.back().end = end;
         } else {
-            runs_.push_back({tokens_.size(), noExpand});
+            runs_.push_back({end, noExpand});
         }
     }
 
-    [[nodiscard]] const LexedText& tokens() const noexcept { return tokens_; }
+    /// Hands the tokens and their runs over, in exchange for memory to use again.
+    void moveTo(SharedText& text, std::vector<Run>& runs) {
+        (void)open();
+        text = std::move(text_);
+        runs.swap(runs_);
+    }
+
+    [[nodiscard]] const LexedText& tokens() { return open(); }
 
     [[nodiscard]] const std::vector<Run>& runs() const noexcept { return runs_; }
 
 private:
-    LexedText tokens_;
+    SharedText text_;
     std::vector<Run> runs_;
 };
 

@@ -19,13 +19,6 @@ namespace {
 // Sources kept for use again; more of them are open at a time only in deep nesting.
 constexpr std::size_t kSpares = 64;
 
-template <typename Scanner>
-void keep(std::vector<std::unique_ptr<Scanner>>& spares, std::unique_ptr<Scanner> scanner) {
-    if (spares.size() < kSpares) {
-        spares.push_back(std::move(scanner));
-    }
-}
-
 }  // namespace
 
 ScannerStack::ScannerStack(FileEvents& events, OutputWriter& output, Reporter& reporter,
@@ -64,18 +57,22 @@ void ScannerStack::pop() {
 }
 
 void ScannerStack::dropCurrent() {
-    Source source = std::move(sources_.back());
+    const bool isFile = sources_.back().isFile;
     sources_.pop_back();
     assert(!sources_.empty());
-    const Source& below = sources_.back();
-    currentSource_ = below.file != nullptr ? static_cast<CppScanner*>(below.file.get())
-                                           : static_cast<CppScanner*>(below.list.get());
-    if (source.file != nullptr) {
+    currentSource_ = sources_.back().scanner;
+    if (isFile) {
+        files_.back()->close();
+        if (spareFiles_.size() < kSpares) {
+            spareFiles_.push_back(std::move(files_.back()));
+        }
         files_.pop_back();
-        source.file->close();
-        keep(spareFiles_, std::move(source.file));
     } else {
-        keep(spareLists_, std::move(source.list));
+        --listsUsed_;
+        lists_[listsUsed_]->release();
+        if (listsUsed_ >= kSpares) {
+            lists_.pop_back();
+        }
     }
 }
 
@@ -85,16 +82,6 @@ std::string ScannerStack::skipWhile(bool (*wanted)(TokenKind)) {
         skipped.append(next().text);
     }
     return skipped;
-}
-
-bool ScannerStack::skipBlanksAndNewlines(std::string& skipped) {
-    skipped.clear();
-    if (!isBlankOrNewline(peek())) {
-        return false;
-    }
-    // The NEWLINE that a file supplies at its end has no text, but it counts.
-    skipped = skipWhile(isBlankOrNewline);
-    return true;
 }
 
 void ScannerStack::skipToEndOfLine() {
@@ -128,39 +115,37 @@ void ScannerStack::pushFileText(const std::string& fileName, std::string_view te
 }
 
 void ScannerStack::enter(std::unique_ptr<CppFileScanner> file) {
-    files_.push_back(file.get());
     currentSource_ = file.get();
-    sources_.push_back({std::move(file), nullptr});
+    sources_.push_back({file.get(), true});
+    files_.push_back(std::move(file));
     events_.fileEntered();
 }
 
-CppTokenScanner& ScannerStack::pushTokens() {
+CppTokenScanner& ScannerStack::pushList() {
     // A list that is read to its end has nothing more to say; without this, a macro that ends in
     // the name of another would leave a source behind for each.
-    while (!atFloor() && sources_.back().list != nullptr && sources_.back().list->isExhausted()) {
-        dropCurrent();
+    dropReadLists();
+    if (listsUsed_ == lists_.size()) {
+        lists_.push_back(std::make_unique<CppTokenScanner>(commentSink()));
     }
-    if (spareLists_.empty()) {
-        spareLists_.push_back(std::make_unique<CppTokenScanner>(commentSink()));
-    }
-    sources_.push_back({nullptr, std::move(spareLists_.back())});
-    spareLists_.pop_back();
-    CppTokenScanner& list = *sources_.back().list;
+    CppTokenScanner& list = *lists_[listsUsed_];
+    ++listsUsed_;
+    sources_.push_back({&list, false});
     currentSource_ = &list;
     return list;
 }
 
-void ScannerStack::pushPieces(Pieces& pieces) {
-    pushTokens().read(pieces);
+void ScannerStack::pushPieces(Pieces&& pieces) {
+    pushList().read(std::move(pieces));
 }
 
-void ScannerStack::pushShared(std::shared_ptr<const LexedText> text, NoExpandSet noExpand) {
-    pushTokens().read(std::move(text), noExpand);
+void ScannerStack::pushSlice(TextSlice slice, NoExpandSet noExpand) {
+    pushList().read(std::move(slice), noExpand);
 }
 
-void ScannerStack::isolate(Pieces& pieces) {
+void ScannerStack::isolate(TextSlice slice, NoExpandSet noExpand) {
     savedFloors_.push_back(floor_);
-    pushPieces(pieces);
+    pushSlice(std::move(slice), noExpand);
     floor_ = sources_.size();
 }
 

@@ -60,8 +60,20 @@ public:
     /// Consumes blanks and returns their texts, joined.
     std::string skipBlanks() { return skipWhile(isBlank); }
 
-    /// Consumes blanks and line ends and returns their texts, joined. Tells whether there were any.
-    bool skipBlanksAndNewlines(std::string& skipped);
+    /// Consumes blanks and line ends and returns their texts, joined.
+    std::string skipBlanksAndNewlines() { return skipWhile(isBlankOrNewline); }
+
+    /// Consumes blanks and line ends. Tells whether there were any: the NEWLINE that a file
+    /// supplies at its end has no text, but it counts.
+    bool passBlanksAndNewlines() {
+        bool any = false;
+        while (isBlankOrNewline(peek())) {
+            (void)currentSource_->next();
+            any = true;
+        }
+        return any;
+    }
+
     /// Consumes tokens up to and including a NEWLINE, at least one.
     void skipToEndOfLine();
 
@@ -71,13 +83,13 @@ public:
     [[nodiscard]] bool pushFile(const std::string& fileName, std::string_view messageName = {});
     /// Reads a text as if it were a file.
     void pushFileText(const std::string& fileName, std::string_view text);
-    /// Reads pieces, taking them over; what is left of `pieces` is memory to use again.
-    void pushPieces(Pieces& pieces);
-    /// Reads a text that stays shared with its owner, as one piece.
-    void pushShared(std::shared_ptr<const LexedText> text, NoExpandSet noExpand);
+    /// Reads pieces, taking them over; `pieces` must be restarted before it is used again.
+    void pushPieces(Pieces&& pieces);
+    /// Reads one piece.
+    void pushSlice(TextSlice slice, NoExpandSet noExpand);
 
-    /// Reads pieces on their own: until `endIsolation`, reading ends where they end.
-    void isolate(Pieces& pieces);
+    /// Reads one piece on its own: until `endIsolation`, reading ends where it ends.
+    void isolate(TextSlice slice, NoExpandSet noExpand);
     void endIsolation();
 
     /// Returns the file that is being read, also while a macro's replacement is read.
@@ -88,9 +100,21 @@ public:
     [[nodiscard]] SourcePosition position() const { return files_.back()->position(); }
 
     /// Returns the file if the next token comes straight from it, otherwise null.
-    [[nodiscard]] CppFileScanner* fileReadNow() noexcept {
-        return currentSource_ == files_.back() ? files_.back() : nullptr;
+    [[nodiscard]] CppFileScanner* fileReadNow() {
+        dropReadLists();
+        return sources_.back().isFile ? files_.back().get() : nullptr;
     }
+
+    /// Returns the list if the next token comes from one and may be taken as a part of it,
+    /// otherwise null.
+    [[nodiscard]] CppTokenScanner* listReadNow() noexcept {
+        return listsUsed_ > 0 && !options_.plainRoad && !sources_.back().isFile
+                   ? lists_[listsUsed_ - 1].get()
+                   : nullptr;
+    }
+
+    /// Tells whether every token must be read by itself.
+    [[nodiscard]] bool plainRoad() const noexcept { return options_.plainRoad; }
 
     /// Does what reading a token of a text does beside yielding it.
     void carryOutEffects(const LexedText& text, std::size_t index) {
@@ -112,30 +136,36 @@ private:
     [[nodiscard]] Token nextBelow();
     [[nodiscard]] std::string skipWhile(bool (*wanted)(TokenKind));
     void enter(std::unique_ptr<CppFileScanner> file);
-    [[nodiscard]] CppTokenScanner& pushTokens();
+    [[nodiscard]] CppTokenScanner& pushList();
     void pop();
     void dropCurrent();
+    void dropReadLists() {
+        while (!sources_.back().isFile && !atFloor() && lists_[listsUsed_ - 1]->isExhausted()) {
+            dropCurrent();
+        }
+    }
 
     FileEvents& events_;
     OutputWriter& output_;
     Reporter& reporter_;
     RunOptions options_;
 
-    // One of the two.
     struct Source {
-        std::unique_ptr<CppFileScanner> file;
-        std::unique_ptr<CppTokenScanner> list;
+        CppScanner* scanner;
+        bool isFile;
     };
 
     CppScanner* currentSource_ = nullptr;
-    std::vector<Source> sources_;         // the current one is the last
-    std::vector<CppFileScanner*> files_;  // those of the sources that are files
+    std::vector<Source> sources_;  // the current one is the last
+    // Those of the sources that are files and, up to `listsUsed_`, those that are lists, in the
+    // same order; the lists behind them are to be used again.
+    std::vector<std::unique_ptr<CppFileScanner>> files_;
+    std::vector<std::unique_ptr<CppTokenScanner>> lists_;
+    std::size_t listsUsed_ = 0;
+    std::vector<std::unique_ptr<CppFileScanner>> spareFiles_;
     // Reading stays at or above this many sources: the main file, or the source read on its own.
     std::size_t floor_ = 1;
     std::vector<std::size_t> savedFloors_;
-    std::vector<std::unique_ptr<CppTokenScanner>>
-        spareLists_;  // read to their ends, to be used again
-    std::vector<std::unique_ptr<CppFileScanner>> spareFiles_;
     std::size_t commentEffects_ = 0;
 };
 

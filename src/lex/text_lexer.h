@@ -8,6 +8,7 @@
 #include "lex/comment_sink.h"
 #include "lex/cpp_lexer.h"
 #include "lex/lexed_text.h"
+#include "lex/shared_text.h"
 
 namespace umpre {
 
@@ -20,10 +21,21 @@ public:
     /// Adds the tokens of `text` to `to`. What comments in it do is recorded there, not done.
     void append(LexedText& to, std::string_view text);
 
+    /// Returns the tokens of `text`.
+    [[nodiscard]] SharedText lexed(std::string_view text) {
+        SharedText result = texts_.take();
+        append(result.edit(), text);
+        return result;
+    }
+
+    /// Returns the pool for texts that are made of others. It must outlive them.
+    [[nodiscard]] TextPool& texts() noexcept { return texts_; }
+
 private:
     void commentLineEnds(std::size_t count) override;
     void unterminatedComment(std::int32_t line) override;
 
+    TextPool texts_;
     std::string memory_;
     CppLexer lexer_;
     LexedText* to_ = nullptr;

@@ -7,6 +7,8 @@
 
 namespace umpre {
 
+struct Name;
+
 /// What a token is. A punctuator of one character has that character's code; the named kinds start
 /// at 257. The directive words keep their own kinds wherever they stand.
 enum class TokenKind : std::int32_t {
@@ -72,6 +74,8 @@ enum class TokenKind : std::int32_t {
 struct Token {
     TokenKind kind = TokenKind::END_OF_INPUT;
     std::string_view text;
+    /// The entry of a name, if its source knows it.
+    Name* name = nullptr;
 };
 
 /// Tells whether a token may name a macro: an identifier or a directive word, but not `defined`.

@@ -39,8 +39,9 @@ public:
 
     [[nodiscard]] bool functionLike() const noexcept { return functionLike_; }
 
-    /// The text made ready for use; null until then.
+    /// The text made ready for use; null until that is worth keeping.
     mutable std::shared_ptr<const MacroBody> body;
+    mutable bool wasUsed = false;
 
 private:
     friend class MacroTable;

@@ -24,7 +24,7 @@ using enum TokenKind;
 class BodyBuilder {
 public:
     BodyBuilder(const Macro& macro, const LexedText& text, MacroBody& body)
-        : text_(text), body_(body) {
+        : text_(text), body_(body), tokens_(body.tokens.edit()) {
         std::string_view names = macro.parameters();
         for (std::size_t index = 0; index < macro.parameterCount(); ++index) {
             const std::size_t size = std::min(names.find(','), names.size());
@@ -81,7 +81,7 @@ private:
         if (!pasting_) {
             writeHeld();
             if (blank_ && !isFirst_) {
-                body_.tokens.append(WHITESPACE, " ");
+                tokens_.append(WHITESPACE, " ");
                 writeLastToken();
             }
         }
@@ -122,8 +122,8 @@ private:
         if (const std::optional<std::size_t> parameter = parameterAt(at_)) {
             return BodyOperand{BodyOperand::Kind::RawArgument, *parameter};
         }
-        body_.tokens.append(kind, text_.text(at_));
-        return BodyOperand{BodyOperand::Kind::Token, body_.tokens.size() - 1};
+        tokens_.append(kind, text_.text(at_), text_.name(at_));
+        return BodyOperand{BodyOperand::Kind::Token, tokens_.size() - 1};
     }
 
     [[nodiscard]] std::optional<std::size_t> parameterAt(std::size_t index) const {
@@ -152,7 +152,7 @@ private:
 
     // Puts the token last added to the body's own into the replacement.
     void writeLastToken() {
-        const std::size_t last = body_.tokens.size();
+        const std::size_t last = tokens_.size();
         if (!body_.steps.empty() && body_.steps.back().kind == BodyStep::Kind::Tokens
             && body_.steps.back().last == last - 1) {
             body_.steps.back().last = last;
@@ -177,6 +177,7 @@ private:
     std::unordered_map<std::string_view, std::size_t> parameters_;  // to their numbers
     const LexedText& text_;
     MacroBody& body_;
+    LexedText& tokens_;
     std::size_t at_ = 0;
     std::size_t effectsNoted_ = 0;
     std::optional<Held> held_;
@@ -188,22 +189,38 @@ private:
 
 }  // namespace
 
-const std::shared_ptr<const MacroBody>& bodyOf(const Macro& macro, TextLexer& lexer) {
+SharedText BodyMaker::tokensOf(const Macro& macro) {
+    if (macro.body != nullptr) {
+        return macro.body->tokens;
+    }
+    if (!macro.wasUsed) {
+        macro.wasUsed = true;
+        SharedText tokens = lexer_.lexed(macro.text());
+        macros_.setNames(tokens.edit());
+        return tokens;
+    }
+    auto body = std::make_shared<MacroBody>();
+    body->tokens = SharedText::alone();
+    lexer_.append(body->tokens.edit(), macro.text());
+    macros_.enterNames(body->tokens.edit());
+    macro.body = std::move(body);
+    return macro.body->tokens;
+}
+
+const MacroBody& BodyMaker::bodyOf(const Macro& macro) {
     if (macro.body == nullptr) {
         auto body = std::make_shared<MacroBody>();
-        if (macro.functionLike()) {
-            LexedText source;
-            lexer.append(source, macro.text());
-            BodyBuilder(macro, source, *body).build();
-            if (source.hasEffects()) {
-                body->source = std::move(source);
-            }
-        } else {
-            lexer.append(body->tokens, macro.text());
+        body->tokens = SharedText::alone();
+        LexedText source;
+        lexer_.append(source, macro.text());
+        macros_.enterNames(source);
+        BodyBuilder(macro, source, *body).build();
+        if (source.hasEffects()) {
+            body->source = std::move(source);
         }
         macro.body = std::move(body);
     }
-    return macro.body;
+    return *macro.body;
 }
 
 }  // namespace umpre

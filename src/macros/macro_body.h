@@ -3,12 +3,13 @@
 #define UMPRE_MACROS_MACRO_BODY_H
 
 #include <cstddef>
-#include <memory>
 #include <vector>
 
 #include "lex/lexed_text.h"
+#include "lex/shared_text.h"
 #include "lex/text_lexer.h"
 #include "macros/macro.h"
+#include "macros/macro_table.h"
 
 namespace umpre {
 
@@ -42,15 +43,28 @@ struct BodyOperand {
 /// A replacement text made ready for use: lexed, and, for a function-like macro, with what `#`,
 /// `##` and the parameters ask for worked out.
 struct MacroBody {
-    LexedText tokens;
+    SharedText tokens;
     // For function-like macros only:
     LexedText source;  // the text as lexed, if reading it has effects
     std::vector<BodyStep> steps;
     std::vector<BodyOperand> operands;
 };
 
-/// Returns the body of a macro, made at the first call.
-[[nodiscard]] const std::shared_ptr<const MacroBody>& bodyOf(const Macro& macro, TextLexer& lexer);
+/// Makes bodies.
+class BodyMaker {
+public:
+    BodyMaker(TextLexer& lexer, MacroTable& macros) noexcept : lexer_(lexer), macros_(macros) {}
+
+    /// Returns the tokens of an object-like macro. They are kept from the second use on: of many
+    /// macros that name each other each is often used once.
+    [[nodiscard]] SharedText tokensOf(const Macro& macro);
+    /// Returns the body of a function-like macro, made at the first use.
+    [[nodiscard]] const MacroBody& bodyOf(const Macro& macro);
+
+private:
+    TextLexer& lexer_;
+    MacroTable& macros_;
+};
 
 }  // namespace umpre
 

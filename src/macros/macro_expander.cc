@@ -6,7 +6,7 @@
 // `invocations_` is the stack, and two kinds of work take turns until the outermost replacement is
 // pushed,
 //
-//     buildReplacement   takes the steps of the innermost body, until an argument must be expanded
+//     Substitution       takes the steps of the innermost body, until an argument must be expanded
 //     readList           reads that argument, alone, until its end or until an invocation begins
 //
 // For P(P(x)) in text: P begins; its step "Argument 0" has "P(x)" read alone; there the inner P
@@ -16,32 +16,41 @@
 
 #include <utility>
 
+#include "macros/argument_slices.h"
 #include "macros/predefined_macros.h"
-#include "macros/stringize.h"
 
 namespace umpre {
 
 using enum TokenKind;
 
-std::string_view MacroExpander::expandName(std::string_view name) {
-    MacroName* macroName = nullptr;
-    switch (lookAt(name, macroName)) {
-    case Outcome::Name: return name;
-    case Outcome::Uncalled: written_.assign(skipped_).append(macroName->text); return written_;
+std::string_view MacroExpander::expandName(const Token& token) {
+    MacroName* name = nullptr;
+    switch (lookAt(token, name)) {
+    case Outcome::Name: return token.text;
+    case Outcome::Uncalled: written_.assign(skipped_).append(name->text); return written_;
+    case Outcome::Text: return text_->joined();
     case Outcome::Pushed: return {};
     case Outcome::Begun: finishInvocations(); return {};
-    case Outcome::Abandoned: return macroName->text;
+    case Outcome::Abandoned: return name->text;
     }
     return {};
 }
 
+std::string_view MacroExpander::takeText() {
+    CppTokenScanner* const list = sources_.listReadNow();
+    if (list == nullptr) {
+        return {};
+    }
+    const std::size_t first = list->takePlain(macros_.filter(), NEWLINE);
+    return list->text()->joined(first, list->position());
+}
+
 std::string MacroExpander::expandLine(std::string_view text, LineKind kind) {
     lineKind_ = kind;
-    Pieces pieces;
-    lexer_.append(pieces.open(), text);
-    pieces.close({});
-    sources_.isolate(pieces);
-    Pieces result;
+    SharedText line = lexer_.lexed(text);
+    macros_.setNames(line.edit());
+    sources_.isolate(TextSlice::whole(std::move(line)), {});
+    Pieces result(lexer_.texts().take());
     while (!readList(result)) {
         finishInvocations();
     }
@@ -50,48 +59,108 @@ std::string MacroExpander::expandLine(std::string_view text, LineKind kind) {
     return result.tokens().joined();
 }
 
-MacroExpander::Outcome MacroExpander::lookAt(std::string_view text, MacroName*& name) {
-    name = macros_.find(text);
+MacroExpander::Outcome MacroExpander::lookAt(const Token& token, MacroName*& name) {
+    name = entryOf(token);
     if (name == nullptr || sets_.contains(sources_.noExpandSet(), *name)) {
         return Outcome::Name;
     }
-    refreshPredefined(macros_, *name, sources_.position());
-    if (name->macro.functionLike()) {
-        return beginInvocation(*name);
+    if (mayBeRefreshed(*name)) {
+        refresh(*name);
     }
-    const std::shared_ptr<const MacroBody>& body = bodyOf(name->macro, lexer_);
-    sources_.pushShared({body, &body->tokens}, sets_.with(sources_.noExpandSet(), *name));
+    return name->macro.functionLike() ? beginInvocation(*name) : replaceObject(*name);
+}
+
+MacroName* MacroExpander::entryOf(const Token& token) {
+    if (token.name == nullptr || sources_.plainRoad()) {
+        return macros_.find(token.text);
+    }
+    return token.name->isDefined ? &MacroTable::entryOf(*token.name) : nullptr;
+}
+
+void MacroExpander::refresh(MacroName& name) {
+    std::shared_ptr<const MacroBody> before = name.macro.body;
+    refreshPredefined(macros_, name, sources_.position());
+    if (!invocations_.empty() && before != name.macro.body) {
+        retired_.push_back(std::move(before));
+    }
+}
+
+MacroExpander::Outcome MacroExpander::replaceObject(const MacroName& name) {
+    SharedText tokens = bodies_.tokensOf(name.macro);
+    const NoExpandSet noExpand = sets_.with(sources_.noExpandSet(), name);
+    if (!sources_.plainRoad() && isText(*tokens)) {
+        text_ = std::move(tokens);
+        textSet_ = noExpand;
+        return Outcome::Text;
+    }
+    sources_.pushSlice(TextSlice::whole(std::move(tokens)), noExpand);
     return Outcome::Pushed;
+}
+
+// Tells whether reading a text again would find nothing to do in it.
+bool MacroExpander::isText(const LexedText& text) const {
+    if (text.hasEffects()) {
+        return false;
+    }
+    for (std::size_t index = 0; index < text.size(); ++index) {
+        const TokenKind kind = text.kind(index);
+        if (kind == NEWLINE || kind == KW_DEFINED
+            || (isName(kind) && mayBeMacro(text, index, macros_.filter()))) {
+            return false;
+        }
+    }
+    return true;
 }
 
 MacroExpander::Outcome MacroExpander::beginInvocation(const MacroName& name) {
     const NoExpandSet inherited = sources_.noExpandSet();
-    // The definition stays the same while arguments are read: they hold no directives.
-    const Macro& macro = name.macro;
-    (void)sources_.skipBlanksAndNewlines(skipped_);
+    skipped_.clear();
     if (sources_.peek() != LEFT_PARENTHESIS) {
-        return Outcome::Uncalled;
+        skipped_ = sources_.skipBlanksAndNewlines();
+        if (sources_.peek() != LEFT_PARENTHESIS) {
+            return Outcome::Uncalled;
+        }
     }
     std::unique_ptr<Invocation> invocation = newInvocation();
-    if (!collectArguments(sources_, reporter_, macro.parameterCount(), invocation->arguments)) {
-        spare_.push_back(std::move(invocation));
+    // The definition stays the same while arguments are read: they hold no directives.
+    if (!collect(name.macro, invocation->arguments)) {
+        keepInvocation(std::move(invocation));
         return Outcome::Abandoned;
     }
-    invocation->body = bodyOf(macro, lexer_);
+    invocation->body = &bodies_.bodyOf(name.macro);
     invocation->noExpand = sets_.with(inherited, name);
     invocations_.push_back(std::move(invocation));
     return Outcome::Begun;
 }
 
-std::unique_ptr<MacroExpander::Invocation> MacroExpander::newInvocation() {
-    if (spare_.empty()) {
-        return std::make_unique<Invocation>();
+bool MacroExpander::collect(const Macro& macro, ArgumentList& arguments) {
+    CppTokenScanner* const list = sources_.listReadNow();
+    if (list != nullptr && takeArgumentSlices(*list, macro.parameterCount(), arguments)) {
+        return true;
     }
-    std::unique_ptr<Invocation> invocation = std::move(spare_.back());
-    spare_.pop_back();
+    arguments.release();
+    return collector_.collect(macro.parameterCount(), arguments);
+}
+
+std::unique_ptr<Invocation> MacroExpander::newInvocation() {
+    std::unique_ptr<Invocation> invocation;
+    if (spare_.empty()) {
+        invocation = std::make_unique<Invocation>();
+    } else {
+        invocation = std::move(spare_.back());
+        spare_.pop_back();
+    }
     invocation->step = 0;
-    invocation->replacement.clear();
+    invocation->replacement.restart(lexer_.texts().take());
     return invocation;
+}
+
+void MacroExpander::keepInvocation(std::unique_ptr<Invocation> invocation) {
+    constexpr std::size_t kSpares = 64;
+    if (spare_.size() < kSpares) {
+        invocation->arguments.release();
+        spare_.push_back(std::move(invocation));
+    }
 }
 
 void MacroExpander::finishInvocations() {
@@ -101,80 +170,32 @@ void MacroExpander::finishInvocations() {
             if (readList(invocation.expanding->expansion)) {
                 endArgument(invocation);
             }
-        } else if (buildReplacement(invocation)) {
+        } else if (Argument* const needed = substitution_.build(invocation)) {
+            beginArgument(invocation, *needed);
+        } else {
             pushReplacement();
         }
     }
+    retired_.clear();
 }
 
 void MacroExpander::pushReplacement() {
-    constexpr std::size_t kSpares = 64;
     std::unique_ptr<Invocation> finished = std::move(invocations_.back());
     invocations_.pop_back();
-    sources_.pushPieces(finished->replacement);
-    if (spare_.size() < kSpares) {
-        spare_.push_back(std::move(finished));
-    }
-}
-
-// Returns false when an argument must be read first; the step is then taken again.
-bool MacroExpander::buildReplacement(Invocation& invocation) {
-    const MacroBody& body = *invocation.body;
-    while (invocation.step < body.steps.size()) {
-        const BodyStep& step = body.steps[invocation.step];
-        switch (step.kind) {
-        case BodyStep::Kind::Tokens:
-            invocation.replacement.append(body.tokens, step.first, step.last, invocation.noExpand);
-            break;
-        case BodyStep::Kind::Effects: sources_.carryOutEffects(body.source, step.first); break;
-        case BodyStep::Kind::Argument:
-            if (!addArgument(invocation, invocation.arguments[step.first])) {
-                return false;
-            }
-            break;
-        case BodyStep::Kind::Joined: addJoined(invocation, step); break;
-        case BodyStep::Kind::Misplaced:
-            reporter_.reportError("Macro variable expected after '#' operator");
-            break;
-        case BodyStep::Kind::PasteFirst:
-            reporter_.reportError(
-                "'##' operator cannot be at the beginning of the replacement list");
-            break;
-        case BodyStep::Kind::PasteLast:
-            reporter_.reportError("'##' operator cannot be at the end of the replacement list");
-            break;
-        }
-        ++invocation.step;
-    }
-    return true;
-}
-
-// Adds an argument's expansion. Returns false, having begun to read it, if it is not known.
-bool MacroExpander::addArgument(Invocation& invocation, Argument& argument) {
-    if (argument.state == Argument::Expansion::Unknown) {
-        beginArgument(invocation, argument);
-        return false;
-    }
-    std::size_t first = 0;
-    for (const Pieces::Run& run : argument.expansion.runs()) {
-        invocation.replacement.append(argument.expansion.tokens(), first, run.end,
-                                      sets_.united(run.noExpand, invocation.noExpand));
-        first = run.end;
-    }
-    if (argument.state == Argument::Expansion::ForOneUse) {
-        argument.state = Argument::Expansion::Unknown;
-    }
-    return true;
+    sources_.pushPieces(std::move(finished->replacement));
+    keepInvocation(std::move(finished));
 }
 
 void MacroExpander::beginArgument(Invocation& invocation, Argument& argument) {
-    scratch_.clear();
-    lexer_.append(scratch_.open(), argument.text);
-    scratch_.close(argument.noExpand);
-    argument.expansion.clear();
+    TextSlice slice = argument.raw;
+    if (argument.mustBeLexed || sources_.plainRoad()) {
+        slice = TextSlice::whole(lexer_.lexed(argument.raw.joined()));
+        macros_.setNames(slice.text.edit());
+    }
+    argument.expansion.restart(lexer_.texts().take());
     invocation.expanding = &argument;
     invocation.effectsBefore = effects();
-    sources_.isolate(scratch_);
+    sources_.isolate(std::move(slice), argument.noExpand);
 }
 
 // An expansion that reported something, or wrote the line ends of a comment, must do so at each
@@ -187,29 +208,15 @@ void MacroExpander::endArgument(Invocation& invocation) {
     invocation.expanding = nullptr;
 }
 
-void MacroExpander::addJoined(Invocation& invocation, const BodyStep& step) {
-    const MacroBody& body = *invocation.body;
-    joined_.clear();
-    for (std::size_t index = step.first; index < step.last; ++index) {
-        const BodyOperand operand = body.operands[index];
-        switch (operand.kind) {
-        case BodyOperand::Kind::Token: joined_ += body.tokens.text(operand.index); break;
-        case BodyOperand::Kind::RawArgument:
-            joined_ += invocation.arguments[operand.index].text;
-            break;
-        case BodyOperand::Kind::Stringized:
-            stringize(invocation.arguments[operand.index].text, joined_);
-            break;
-        }
-    }
-    lexer_.append(invocation.replacement.open(), joined_);
-    invocation.replacement.close(invocation.noExpand);
-}
-
 // Reads the isolated source to its end and returns true, or returns false when an invocation began
 // that must be finished first; the reading goes on with its replacement.
 bool MacroExpander::readList(Pieces& result) {
-    for (Token token = sources_.next(); token.kind != END_OF_INPUT; token = sources_.next()) {
+    for (;;) {
+        takeList(result);
+        const Token token = sources_.next();
+        if (token.kind == END_OF_INPUT) {
+            return true;
+        }
         if (isName(token.kind)) {
             if (!readName(token, result)) {
                 return false;
@@ -217,24 +224,36 @@ bool MacroExpander::readList(Pieces& result) {
         } else if (token.kind == KW_DEFINED && lineKind_ == LineKind::Condition) {
             keepDefined(token, result);
         } else {
-            result.append(token.kind, token.text, sources_.noExpandSet());
+            result.append(token, sources_.noExpandSet());
         }
     }
-    return true;
+}
+
+// Takes over what would be read token by token and added as it is.
+void MacroExpander::takeList(Pieces& result) {
+    CppTokenScanner* const list = sources_.listReadNow();
+    if (list == nullptr) {
+        return;
+    }
+    const std::size_t first = list->takePlain(macros_.filter(), KW_DEFINED);
+    if (list->position() > first) {
+        result.append(*list->text(), first, list->position(), list->noExpandSet());
+    }
 }
 
 bool MacroExpander::readName(const Token& token, Pieces& result) {
     const NoExpandSet noExpand = sources_.noExpandSet();
     MacroName* name = nullptr;
-    switch (lookAt(token.text, name)) {
-    case Outcome::Name: result.append(token.kind, token.text, noExpand); break;
+    switch (lookAt(token, name)) {
+    case Outcome::Name: result.append(token, noExpand); break;
     case Outcome::Uncalled:
         lexer_.append(result.open(), skipped_);
-        result.append(token.kind, name->text, noExpand);
+        result.append({token.kind, name->text, name}, noExpand);
         break;
+    case Outcome::Text: result.append(*text_, 0, text_->size(), textSet_); break;
     case Outcome::Pushed: break;
     case Outcome::Begun: return false;
-    case Outcome::Abandoned: result.append(token.kind, name->text, noExpand); break;
+    case Outcome::Abandoned: result.append({token.kind, name->text, name}, noExpand); break;
     }
     return true;
 }
@@ -243,7 +262,7 @@ bool MacroExpander::readName(const Token& token, Pieces& result) {
 void MacroExpander::keepDefined(const Token& word, Pieces& result) {
     const auto keep = [&](const Token& token) {
         if (token.kind != END_OF_INPUT) {
-            result.append(token.kind, token.text, sources_.noExpandSet());
+            result.append(token, sources_.noExpandSet());
         }
     };
     const auto keepBlanks = [&] {

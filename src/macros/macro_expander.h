@@ -12,10 +12,12 @@
 #include "lex/pieces.h"
 #include "lex/reporter.h"
 #include "lex/scanner_stack.h"
+#include "lex/shared_text.h"
 #include "lex/text_lexer.h"
 #include "macros/arguments.h"
 #include "macros/macro_body.h"
 #include "macros/macro_table.h"
+#include "macros/substitution.h"
 
 namespace umpre {
 
@@ -31,12 +33,22 @@ class MacroExpander {
 public:
     MacroExpander(ScannerStack& sources, MacroTable& macros, Reporter& reporter,
                   TextLexer& lexer) noexcept
-        : sources_(sources), macros_(macros), reporter_(reporter), lexer_(lexer) {}
+        : sources_(sources),
+          macros_(macros),
+          reporter_(reporter),
+          lexer_(lexer),
+          bodies_(lexer, macros),
+          collector_(sources, macros, reporter, lexer.texts()),
+          substitution_(sources, macros, reporter, lexer, sets_) {}
 
     /// Takes a name that was just read and returns what is to be written for it: the name itself,
-    /// perhaps with blanks before it, or nothing when a replacement was pushed. Valid until the
-    /// next call and the next token read.
-    [[nodiscard]] std::string_view expandName(std::string_view name);
+    /// perhaps with blanks before it, a replacement that holds no macros, or nothing when a
+    /// replacement was pushed. Valid until the next call and the next token read.
+    [[nodiscard]] std::string_view expandName(const Token& token);
+
+    /// Consumes tokens of the current source, if it is a replacement, that are text as they stand,
+    /// and returns their texts, joined. Valid until the next token is read.
+    [[nodiscard]] std::string_view takeText();
 
     /// Returns the rest of a directive line with all its macros expanded.
     [[nodiscard]] std::string expandLine(std::string_view text, LineKind kind);
@@ -46,35 +58,28 @@ private:
     enum class Outcome {
         Name,       // the name is just a name, with no argument list read
         Uncalled,   // a function-like macro without "(": `skipped_` comes before the name
+        Text,       // a replacement that need not be read again: `text_`, with the set `textSet_`
         Pushed,     // a replacement was pushed
         Begun,      // an invocation was added to `invocations_`
         Abandoned,  // an invocation with the wrong arguments: the name is left
     };
 
-    // A function-like macro on its way to its replacement.
-    struct Invocation {
-        std::shared_ptr<const MacroBody> body;
-        NoExpandSet noExpand;  // of the replacement
-        ArgumentList arguments;
-        std::size_t step = 0;  // of the body, to be taken next
-        Pieces replacement;    // as far as it is built
-        // While an argument is expanded: which one, and what had been said and done before.
-        Argument* expanding = nullptr;
-        std::size_t effectsBefore = 0;
-    };
-
-    [[nodiscard]] Outcome lookAt(std::string_view text, MacroName*& name);
+    [[nodiscard]] Outcome lookAt(const Token& token, MacroName*& name);
+    [[nodiscard]] MacroName* entryOf(const Token& token);
+    void refresh(MacroName& name);
+    [[nodiscard]] Outcome replaceObject(const MacroName& name);
+    [[nodiscard]] bool isText(const LexedText& text) const;
     [[nodiscard]] Outcome beginInvocation(const MacroName& name);
+    [[nodiscard]] bool collect(const Macro& macro, ArgumentList& arguments);
     [[nodiscard]] std::unique_ptr<Invocation> newInvocation();
+    void keepInvocation(std::unique_ptr<Invocation> invocation);
     void finishInvocations();
     void pushReplacement();
-    [[nodiscard]] bool buildReplacement(Invocation& invocation);
-    [[nodiscard]] bool addArgument(Invocation& invocation, Argument& argument);
-    void addJoined(Invocation& invocation, const BodyStep& step);
     void beginArgument(Invocation& invocation, Argument& argument);
     void endArgument(Invocation& invocation);
     [[nodiscard]] bool readList(Pieces& result);
     [[nodiscard]] bool readName(const Token& token, Pieces& result);
+    void takeList(Pieces& result);
     void keepDefined(const Token& word, Pieces& result);
     [[nodiscard]] std::size_t effects() const;
 
@@ -83,13 +88,18 @@ private:
     Reporter& reporter_;
     TextLexer& lexer_;
     NoExpandSets sets_;
+    BodyMaker bodies_;
+    ArgumentCollector collector_;
+    Substitution substitution_;
     LineKind lineKind_ = LineKind::Operand;
     std::vector<std::unique_ptr<Invocation>> invocations_;  // the innermost one is the last
     std::vector<std::unique_ptr<Invocation>> spare_;        // finished, to be used again
-    Pieces scratch_;
+    // Bodies whose definitions changed while they were in use, until no invocation is left.
+    std::vector<std::shared_ptr<const MacroBody>> retired_;
     std::string skipped_;
     std::string written_;
-    std::string joined_;
+    SharedText text_;
+    NoExpandSet textSet_;
 };
 
 }  // namespace umpre

@@ -18,12 +18,29 @@ constexpr std::size_t kFirstSlots = 256;
 MacroTable::MacroTable() : slots_(kFirstSlots) {}
 
 MacroName* MacroTable::find(std::string_view name) {
+    MacroName* const entry = findEntry(name);
+    return entry != nullptr && entry->isDefined ? entry : nullptr;
+}
+
+MacroName* MacroTable::findEntry(std::string_view name) {
     const Slot slot = slots_[slotOf(name, hashOfName(name))];
-    if (slot.number == 0) {
-        return nullptr;
+    return slot.number == 0 ? nullptr : &nameIn(slot);
+}
+
+void MacroTable::setNames(LexedText& text, std::size_t first) {
+    for (std::size_t index = first; index < text.size(); ++index) {
+        if (isName(text.kind(index))) {
+            text.setName(index, findEntry(text.text(index)));
+        }
     }
-    MacroName& found = nameIn(slot);
-    return found.isDefined ? &found : nullptr;
+}
+
+void MacroTable::enterNames(LexedText& text) {
+    for (std::size_t index = 0; index < text.size(); ++index) {
+        if (isName(text.kind(index))) {
+            text.setName(index, &enter(text.text(index)));
+        }
+    }
 }
 
 void MacroTable::defineMacro(std::string_view name, std::string_view text) {
@@ -58,7 +75,9 @@ void MacroTable::replace(MacroName& name, const MacroText& definition) {
         definition.parameters.empty() ? 0 : static_cast<std::uint32_t>(commas) + 1;
     macro.functionLike_ = definition.functionLike;
     macro.body.reset();
+    macro.wasUsed = false;
     name.isDefined = true;
+    filter_.add(name.text);
 }
 
 void MacroTable::undefine(std::string_view name) {
@@ -92,7 +111,6 @@ MacroName& MacroTable::enter(std::string_view name) {
         slots_[at] = {hash, static_cast<std::uint32_t>(++nameCount_)};
         char* const bytes = newBytes(name.size());
         nameIn(slots_[at]).text = {bytes, name.copy(bytes, name.size())};
-        filter_.add(name);
     }
     return nameIn(slots_[at]);
 }

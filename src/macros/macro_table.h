@@ -10,6 +10,7 @@
 #include <string_view>
 #include <vector>
 
+#include "lex/lexed_text.h"
 #include "lex/name_filter.h"
 #include "macros/macro.h"
 
@@ -26,6 +27,20 @@ public:
     /// Returns the entry of a defined name, otherwise null. It lives as long as the table; what it
     /// says changes with its definition.
     [[nodiscard]] MacroName* find(std::string_view name);
+
+    /// Returns the entry of a name that was defined or entered at least once, otherwise null.
+    [[nodiscard]] MacroName* findEntry(std::string_view name);
+
+    /// Returns the entry that a name noted in a text belongs to.
+    [[nodiscard]] static MacroName& entryOf(Name& name) noexcept {
+        // NOLINTNEXTLINE(cppcoreguidelines-pro-type-static-cast-downcast): the table makes no other
+        return static_cast<MacroName&>(name);
+    }
+
+    /// Notes in a text, from token `first` on, the entries of those of its names that have one.
+    void setNames(LexedText& text, std::size_t first = 0);
+    /// Notes in a text the entries of its names, making those that are missing.
+    void enterNames(LexedText& text);
 
     /// Enters an object-like macro with this text unless the name is defined.
     void defineMacro(std::string_view name, std::string_view text);

@@ -8,9 +8,6 @@
 namespace umpre {
 namespace {
 
-// Of `__FILE__` as of `__LINE__`; most names are told from them by it.
-constexpr std::size_t kRefreshedLength = 8;
-
 [[nodiscard]] std::string twoDigits(int number, char filling) {
     std::string text = std::to_string(number);
     if (text.size() < 2) {
@@ -39,9 +36,6 @@ void definePredefinedMacros(MacroTable& macros) {
 }
 
 void refreshPredefined(MacroTable& macros, MacroName& name, const SourcePosition& position) {
-    if (name.text.size() != kRefreshedLength) {
-        return;
-    }
     std::string text;
     if (name.text == "__FILE__") {
         text.append("\"").append(position.fileName).append("\"");

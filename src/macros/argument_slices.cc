@@ -1,0 +1,124 @@
+// SPDX-License-Identifier: MIT
+//
+// In F(F(F(x))) the argument of the outermost F is a slice of what is read, and while it is read the
+// argument of the next F is a slice of the same text, and so on. To look for the end of each anew
+// would cost the square of the depth, so an argument that is not short is looked through with the
+// outline of its text, which knows where each parenthesis is closed.
+#include "macros/argument_slices.h"
+
+#include "lex/text_outline.h"
+#include "lex/token_join.h"
+
+namespace umpre {
+namespace {
+
+using enum TokenKind;
+
+// Up to so many tokens are looked at before the outline is asked for.
+constexpr std::size_t kShort = 64;
+
+class Slicer {
+public:
+    explicit Slicer(const CppTokenScanner& list)
+        : list_(list), text_(*list.text()), at_(list.position() + 1) {}
+
+    [[nodiscard]] bool take(std::size_t parameterCount, ArgumentList& arguments) {
+        for (;;) {
+            while (at_ < list_.end() && text_.kind(at_) == WHITESPACE) {
+                ++at_;
+            }
+            if (at_ == list_.end() || isBlankOrNewline(text_.kind(at_))) {
+                return false;
+            }
+            if (text_.kind(at_) == RIGHT_PARENTHESIS) {
+                break;
+            }
+            if (arguments.size() == parameterCount) {
+                return false;
+            }
+            Argument& argument = arguments.add(list_.text());
+            if (!takeOne(argument)) {
+                return false;
+            }
+            argument.noExpand = list_.noExpandSetAt(at_);
+            if (text_.kind(at_) == RIGHT_PARENTHESIS) {
+                break;
+            }
+            ++at_;
+        }
+        ++at_;
+        return arguments.size() == parameterCount;
+    }
+
+    /// Behind the last token of the invocation.
+    [[nodiscard]] std::size_t end() const noexcept { return at_; }
+
+private:
+    // Goes on to the "," or ")" that ends the argument. Returns false if there is none.
+    [[nodiscard]] bool takeOne(Argument& argument) {
+        argument.raw.first = at_;
+        argument.raw.last = at_;
+        const TextOutline* outline = nullptr;
+        std::size_t depth = 0;
+        for (; at_ < list_.end(); ++at_) {
+            if (at_ == argument.raw.first + kShort && text_.outline().isPlain) {
+                outline = &text_.outline();
+            }
+            const TokenKind kind = text_.kind(at_);
+            if (depth == 0 && (kind == COMMA || kind == RIGHT_PARENTHESIS)) {
+                return true;
+            }
+            if (outline == nullptr && !look(argument)) {
+                return false;
+            }
+            if (kind == LEFT_PARENTHESIS) {
+                const std::size_t closing = outline == nullptr ? 0 : outline->closing[at_];
+                if (closing > 0 && closing < list_.end()) {
+                    at_ = closing;
+                } else {
+                    ++depth;
+                }
+            } else if (kind == RIGHT_PARENTHESIS) {
+                --depth;
+            }
+            if (kind != WHITESPACE) {
+                argument.raw.last = at_ + 1;
+            }
+        }
+        return false;
+    }
+
+    // Looks at one token of an argument. Returns false if it is a blank that must be changed.
+    [[nodiscard]] bool look(Argument& argument) const {
+        const Token token = text_.token(at_);
+        if (isBlankOrNewline(token.kind)) {
+            return token.text == " " && text_.kind(at_ - 1) != WHITESPACE;
+        }
+        const bool meets = argument.raw.last == at_ && at_ > argument.raw.first;
+        if (isLoneQuote(token) || (meets && mayJoin(text_.token(at_ - 1), token))) {
+            argument.mustBeLexed = true;
+        }
+        return true;
+    }
+
+    const CppTokenScanner& list_;
+    const LexedText& text_;
+    std::size_t at_;
+};
+
+}  // namespace
+
+bool takeArgumentSlices(CppTokenScanner& list, std::size_t parameterCount,
+                        ArgumentList& arguments) {
+    if (list.text()->hasEffects()) {
+        return false;
+    }
+    Slicer slicer(list);
+    if (!slicer.take(parameterCount, arguments)) {
+        return false;
+    }
+    list.moveTo(slicer.end());
+    return true;
+}
+
+}  // namespace umpre
