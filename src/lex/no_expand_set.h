@@ -51,8 +51,8 @@ struct Name {
     bool isDefined = false;         ///< there is a macro of this name now
     mutable bool isMarked = false;  ///< by NoExpandSets, which looks into large sets that way
     // Which set the name was last added to, and what that gave.
-    mutable NoExpandSet extended;
-    mutable NoExpandSet extension;
+    mutable NoExpandSet extended{};
+    mutable NoExpandSet extension{};
 };
 
 /// Makes and owns the sets of a run. Small sets made by adding the same names in the same order are

@@ -32,8 +32,7 @@ struct Condition : SourceFixture {
     explicit Condition(std::string_view text) : SourceFixture("\n") {
         macros.defineMacro("X", "");
         macros.defineMacro("line", "");
-        Pieces pieces = piecesOf(text);
-        sources.isolate(pieces);
+        isolateText(text);
         value = evaluator.evaluate(ok);
         left = rest();
         sources.endIsolation();

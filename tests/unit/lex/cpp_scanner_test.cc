@@ -17,13 +17,11 @@ using enum TokenKind;
 struct CppScannerTest : ::testing::Test {
     CppScannerTest() {
         file.openText("main", kText);
-        Pieces pieces;
-        TextLexer().append(pieces.open(), kText);
-        pieces.close({});
-        list.read(pieces);
+        list.read(TextSlice::whole(lexer.lexed(kText)), {});
     }
 
     static constexpr std::string_view kText = "a/*\n*/b\n";
+    TextLexer lexer;
     testing::RecordingCommentSink fileComments;
     testing::RecordingCommentSink listComments;
     CppFileScanner file{fileComments};

@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 #include "lex/cpp_token_scanner.h"
 
-#include <memory>
 #include <string_view>
+#include <utility>
 
 #include <gtest/gtest.h>
 
@@ -25,10 +25,8 @@ struct CppTokenScannerTest : ::testing::Test {
         pieces.close(noExpand);
     }
 
-    [[nodiscard]] std::shared_ptr<const LexedText> shared(std::string_view text) {
-        auto result = std::make_shared<LexedText>();
-        lexer.append(*result, text);
-        return result;
+    [[nodiscard]] TextSlice slice(std::string_view text) {
+        return TextSlice::whole(lexer.lexed(text));
     }
 
     TextLexer lexer;
@@ -46,7 +44,7 @@ TEST_F(CppTokenScannerTest, GivesTheTokensOfAllPieces) {
     add("x ", setA);
     add("+", setB);
     add(" y", setA);
-    list.read(pieces);
+    list.read(std::move(pieces));
     EXPECT_EQ(readLexemes(list), (Lexemes{{IDENTIFIER, "x"},
                                           {WHITESPACE, " "},
                                           {PLUS, "+"},
@@ -59,14 +57,14 @@ TEST_F(CppTokenScannerTest, NoTokenReachesFromOnePieceIntoTheNext) {
     add("y", setB);
     add("#", setB);
     add("#", setB);
-    list.read(pieces);
+    list.read(std::move(pieces));
     EXPECT_EQ(readLexemes(list),
               (Lexemes{{IDENTIFIER, "x"}, {IDENTIFIER, "y"}, {HASH, "#"}, {HASH, "#"}}));
 }
 
 TEST_F(CppTokenScannerTest, SuppliesNoLineEnd) {
     add("x", setA);
-    list.read(pieces);
+    list.read(std::move(pieces));
     (void)list.next();
     EXPECT_EQ(list.peek(), END_OF_INPUT);
 }
@@ -74,7 +72,7 @@ TEST_F(CppTokenScannerTest, SuppliesNoLineEnd) {
 TEST_F(CppTokenScannerTest, TheSetIsThatOfTheTokenLastRead) {
     add("x y", setA);
     add("z", setB);
-    list.read(pieces);
+    list.read(std::move(pieces));
     for (int count = 0; count < 3; ++count) {
         (void)list.next();
         EXPECT_EQ(list.noExpandSet(), setA);
@@ -88,46 +86,46 @@ TEST_F(CppTokenScannerTest, TheSetIsThatOfTheTokenLastRead) {
 TEST_F(CppTokenScannerTest, AfterTheEndTheSetIsThatOfTheLastPiece) {
     add("x", setA);
     add("y", setB);
-    list.read(pieces);
+    list.read(std::move(pieces));
     (void)readText(list);
     EXPECT_EQ(list.next().kind, END_OF_INPUT);
     EXPECT_EQ(list.noExpandSet(), setB);
 }
 
 TEST_F(CppTokenScannerTest, EmptyPiecesAreTheEnd) {
-    list.read(pieces);
+    list.read(std::move(pieces));
     EXPECT_EQ(list.next().kind, END_OF_INPUT);
     EXPECT_EQ(list.noExpandSet(), NoExpandSet());
     add("", setA);
-    list.read(pieces);
+    list.read(std::move(pieces));
     EXPECT_EQ(list.next().kind, END_OF_INPUT);
 }
 
 TEST_F(CppTokenScannerTest, TakesThePiecesOver) {
     add("x", setA);
-    list.read(pieces);
-    pieces.clear();
+    list.read(std::move(pieces));
+    pieces.restart();
     add("other", setB);
     EXPECT_EQ(readText(list), "x");
 }
 
-TEST_F(CppTokenScannerTest, ASharedTextIsOnePiece) {
-    list.read(shared("x y"), setA);
+TEST_F(CppTokenScannerTest, ASliceIsOnePiece) {
+    list.read(slice("x y"), setA);
     EXPECT_EQ(readLexemes(list),
               (Lexemes{{IDENTIFIER, "x"}, {WHITESPACE, " "}, {IDENTIFIER, "y"}}));
     EXPECT_EQ(list.noExpandSet(), setA);
 }
 
-TEST_F(CppTokenScannerTest, ASharedTextLivesAsLongAsItIsRead) {
-    std::shared_ptr<const LexedText> text = shared("x y");
+TEST_F(CppTokenScannerTest, ATextLivesAsLongAsItIsRead) {
+    TextSlice text = slice("x y");
     list.read(text, setA);
-    text.reset();
+    text = {};
     EXPECT_EQ(readText(list), "x y");
 }
 
 TEST_F(CppTokenScannerTest, IsUsedUpWhenAllTokensAreTaken) {
     add("x y", setA);
-    list.read(pieces);
+    list.read(std::move(pieces));
     EXPECT_FALSE(list.isExhausted());
     (void)list.next();
     (void)list.next();
@@ -143,27 +141,27 @@ TEST_F(CppTokenScannerTest, IsUsedUpWhenAllTokensAreTaken) {
 }
 
 TEST_F(CppTokenScannerTest, WithoutTokensIsUsedUpFromTheBeginning) {
-    list.read(shared(""), setA);
+    list.read(slice(""), setA);
     EXPECT_TRUE(list.isExhausted());
 }
 
 TEST_F(CppTokenScannerTest, CanReadAnotherListInTheMiddleOfOne) {
     add("x y", setA);
-    list.read(pieces);
+    list.read(std::move(pieces));
     (void)list.next();
     (void)list.peek();
-    list.read(shared("z"), setB);
+    list.read(slice("z"), setB);
     EXPECT_EQ(readText(list), "z");
     EXPECT_EQ(list.noExpandSet(), setB);
-    pieces.clear();
+    pieces.restart();
     add("w", setA);
-    list.read(pieces);
+    list.read(std::move(pieces));
     EXPECT_EQ(readText(list), "w");
     EXPECT_EQ(list.noExpandSet(), setA);
 }
 
 TEST_F(CppTokenScannerTest, CommentsActEachTimeTheirTextIsRead) {
-    const std::shared_ptr<const LexedText> text = shared("x/*\n*/y");
+    const TextSlice text = slice("x/*\n*/y");
     list.read(text, setA);
     (void)readText(list);
     EXPECT_EQ(comments.effects(), "\n");
@@ -174,7 +172,7 @@ TEST_F(CppTokenScannerTest, CommentsActEachTimeTheirTextIsRead) {
 
 TEST_F(CppTokenScannerTest, ACommentActsWhenItsBlankIsRead) {
     add("x/*\n", setA);
-    list.read(pieces);
+    list.read(std::move(pieces));
     (void)list.next();
     EXPECT_EQ(comments.effects(), "");
     (void)list.peek();

@@ -27,9 +27,9 @@ TEST_F(PiecesTest, AreEmptyAtFirst) {
 }
 
 TEST_F(PiecesTest, KeepEachTokenWithItsSet) {
-    pieces.append(IDENTIFIER, "x", setA);
-    pieces.append(PLUS, "+", setB);
-    pieces.append(IDENTIFIER, "y", setA);
+    pieces.append({IDENTIFIER, "x"}, setA);
+    pieces.append({PLUS, "+"}, setB);
+    pieces.append({IDENTIFIER, "y"}, setA);
     EXPECT_EQ(lexemesOf(pieces.tokens()),
               (Lexemes{{IDENTIFIER, "x"}, {PLUS, "+"}, {IDENTIFIER, "y"}}));
     ASSERT_EQ(pieces.runs().size(), 3U);
@@ -42,8 +42,8 @@ TEST_F(PiecesTest, KeepEachTokenWithItsSet) {
 }
 
 TEST_F(PiecesTest, WithEqualSetsSideBySideAreOneRun) {
-    pieces.append(IDENTIFIER, "x", setA);
-    pieces.append(PLUS, "+", setA);
+    pieces.append({IDENTIFIER, "x"}, setA);
+    pieces.append({PLUS, "+"}, setA);
     ASSERT_EQ(pieces.runs().size(), 1U);
     EXPECT_EQ(pieces.runs()[0].end, 2U);
     EXPECT_EQ(pieces.runs()[0].noExpand, setA);
@@ -62,7 +62,7 @@ TEST_F(PiecesTest, TakeTokensOfAText) {
 }
 
 TEST_F(PiecesTest, GiveTokensAddedFromOutsideTheSetTheyAreClosedWith) {
-    pieces.append(IDENTIFIER, "x", setA);
+    pieces.append({IDENTIFIER, "x"}, setA);
     pieces.open().append(PLUS, "+");
     pieces.open().append(INT_DEC, "1");
     pieces.close(setB);
@@ -72,9 +72,9 @@ TEST_F(PiecesTest, GiveTokensAddedFromOutsideTheSetTheyAreClosedWith) {
     EXPECT_EQ(pieces.runs()[1].noExpand, setB);
 }
 
-TEST_F(PiecesTest, AreEmptyAfterBeingCleared) {
-    pieces.append(IDENTIFIER, "x", setA);
-    pieces.clear();
+TEST_F(PiecesTest, AreEmptyAfterARestart) {
+    pieces.append({IDENTIFIER, "x"}, setA);
+    pieces.restart();
     EXPECT_EQ(pieces.tokens().size(), 0U);
     EXPECT_TRUE(pieces.runs().empty());
 }

@@ -75,12 +75,11 @@ TEST(ScannerStack, ATokenLookedAheadAtIsKeptBelowANewSource) {
     EXPECT_EQ(f.rest(), "x a b");
 }
 
-TEST(ScannerStack, ReadsASharedText) {
+TEST(ScannerStack, ReadsAPartOfAText) {
     SourceFixture f("!");
-    auto text = std::make_shared<LexedText>();
-    text->append(IDENTIFIER, "a");
-    f.sources.pushShared(text, {});
-    f.sources.pushShared(text, {});
+    const TextSlice slice{f.lexer.lexed("abc a"), 2, 3};
+    f.sources.pushSlice(slice, {});
+    f.sources.pushSlice(slice, {});
     EXPECT_EQ(f.rest(), "aa!");
 }
 
@@ -171,15 +170,14 @@ TEST(ScannerStack, TheCurrentFileCanBeRenamed) {
     EXPECT_EQ(f.sources.position().line, 7);
 }
 
-TEST(ScannerStack, AFileIsReadNowIfItLiesOnTop) {
+TEST(ScannerStack, AFileIsReadNowIfNothingIsLeftOnTopOfIt) {
     SourceFixture f("a");
     EXPECT_EQ(f.sources.fileReadNow(), &f.sources.currentFile());
     f.pushText("x");
     EXPECT_EQ(f.sources.fileReadNow(), nullptr);
     (void)f.sources.next();
-    EXPECT_EQ(f.sources.fileReadNow(), nullptr);
-    (void)f.sources.next();
     EXPECT_EQ(f.sources.fileReadNow(), &f.sources.currentFile());
+    EXPECT_EQ(f.sources.next().text, "a");
 }
 
 TEST(ScannerStack, OpensFilesByName) {
@@ -251,25 +249,26 @@ TEST(ScannerStack, SkipsBlanksThroughTheEndsOfSources) {
 
 TEST(ScannerStack, SkipsLineEndsToo) {
     SourceFixture f(" \n\r\n\ta");
-    std::string skipped = "old";
-    EXPECT_TRUE(f.sources.skipBlanksAndNewlines(skipped));
-    EXPECT_EQ(skipped, " \n\n\t");
+    EXPECT_EQ(f.sources.skipBlanksAndNewlines(), " \n\n\t");
     EXPECT_EQ(f.sources.next().text, "a");
 }
 
-TEST(ScannerStack, TellsThatNothingWasSkipped) {
+TEST(ScannerStack, SkipsNothingWhereNoBlanksStand) {
     SourceFixture f("a");
-    std::string skipped = "old";
-    EXPECT_FALSE(f.sources.skipBlanksAndNewlines(skipped));
-    EXPECT_EQ(skipped, "");
+    EXPECT_EQ(f.sources.skipBlanksAndNewlines(), "");
+    EXPECT_FALSE(f.sources.passBlanksAndNewlines());
 }
 
-TEST(ScannerStack, ALineEndWithoutTextIsSkippedAsWell) {
+TEST(ScannerStack, TellsThatBlanksOrLineEndsWerePassed) {
+    SourceFixture f(" \n a");
+    EXPECT_TRUE(f.sources.passBlanksAndNewlines());
+    EXPECT_EQ(f.sources.next().text, "a");
+}
+
+TEST(ScannerStack, ALineEndWithoutTextIsPassedAsWell) {
     SourceFixture f("a");
     (void)f.sources.next();
-    std::string skipped;
-    EXPECT_TRUE(f.sources.skipBlanksAndNewlines(skipped));
-    EXPECT_EQ(skipped, "");
+    EXPECT_TRUE(f.sources.passBlanksAndNewlines());
     EXPECT_EQ(f.sources.next().kind, END_OF_INPUT);
 }
 
@@ -291,8 +290,7 @@ TEST(ScannerStack, SkippingToTheEndOfTheLineConsumesAtLeastOneToken) {
 TEST(ScannerStack, AnIsolatedSourceEndsByItself) {
     SourceFixture f("a b");
     (void)f.sources.next();
-    Pieces pieces = f.piecesOf("x y");
-    f.sources.isolate(pieces);
+    f.isolateText("x y");
     EXPECT_EQ(f.rest(), "x y");
     EXPECT_EQ(f.sources.peek(), END_OF_INPUT);
     EXPECT_EQ(f.sources.next().kind, END_OF_INPUT);
@@ -302,8 +300,7 @@ TEST(ScannerStack, AnIsolatedSourceEndsByItself) {
 
 TEST(ScannerStack, SourcesPushedDuringAnIsolationBelongToIt) {
     SourceFixture f("a");
-    Pieces pieces = f.piecesOf("x");
-    f.sources.isolate(pieces);
+    f.isolateText("x");
     f.pushText("y ");
     EXPECT_EQ(f.rest(), "y x");
     f.sources.endIsolation();
@@ -312,10 +309,8 @@ TEST(ScannerStack, SourcesPushedDuringAnIsolationBelongToIt) {
 
 TEST(ScannerStack, IsolationsNest) {
     SourceFixture f("a");
-    Pieces outer = f.piecesOf("x ");
-    f.sources.isolate(outer);
-    Pieces inner = f.piecesOf("y ");
-    f.sources.isolate(inner);
+    f.isolateText("x ");
+    f.isolateText("y ");
     EXPECT_EQ(f.rest(), "y ");
     f.sources.endIsolation();
     EXPECT_EQ(f.rest(), "x ");
@@ -325,8 +320,7 @@ TEST(ScannerStack, IsolationsNest) {
 
 TEST(ScannerStack, WhatIsLeftOfAnIsolatedSourceIsDropped) {
     SourceFixture f("a");
-    Pieces pieces = f.piecesOf("x y z");
-    f.sources.isolate(pieces);
+    f.isolateText("x y z");
     (void)f.sources.next();
     f.sources.endIsolation();
     EXPECT_EQ(f.rest(), "a");
@@ -334,8 +328,7 @@ TEST(ScannerStack, WhatIsLeftOfAnIsolatedSourceIsDropped) {
 
 TEST(ScannerStack, AnExhaustedIsolatedSourceStaysWhenAnotherIsPushed) {
     SourceFixture f("a");
-    Pieces pieces = f.piecesOf("x");
-    f.sources.isolate(pieces);
+    f.isolateText("x");
     (void)f.sources.next();
     f.pushText("y");
     EXPECT_EQ(f.rest(), "y");

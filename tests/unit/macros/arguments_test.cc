@@ -19,10 +19,17 @@ constexpr std::string_view kNotEnough = "There are not enough arguments in a mac
 constexpr std::string_view kTooMany = "A macro invocation has too many arguments";
 constexpr std::string_view kUnterminated = "The macro invocation is improperly terminated";
 
+struct ArgumentsFixture : SourceFixture {
+    using SourceFixture::SourceFixture;
+
+    MacroTable macros;
+    ArgumentCollector collector{sources, macros, reporter, lexer.texts()};
+};
+
 [[nodiscard]] Texts textsOf(ArgumentList& arguments) {
     Texts texts;
     for (std::size_t index = 0; index < arguments.size(); ++index) {
-        texts.push_back(arguments[index].text);
+        texts.emplace_back(arguments[index].raw.joined());
     }
     return texts;
 }
@@ -37,9 +44,9 @@ struct Accepted {
 void expectAccepted(const std::vector<Accepted>& table) {
     for (const Accepted& row : table) {
         SCOPED_TRACE(row.text);
-        SourceFixture f(row.text);
+        ArgumentsFixture f(row.text);
         ArgumentList arguments;
-        EXPECT_TRUE(collectArguments(f.sources, f.reporter, row.parameterCount, arguments));
+        EXPECT_TRUE(f.collector.collect(row.parameterCount, arguments));
         EXPECT_EQ(textsOf(arguments), row.arguments);
         EXPECT_EQ(f.rest(), row.rest);
         EXPECT_EQ(f.reporter.report(), "");
@@ -56,9 +63,9 @@ struct Rejected {
 void expectRejected(const std::vector<Rejected>& table) {
     for (const Rejected& row : table) {
         SCOPED_TRACE(row.text);
-        SourceFixture f(row.text);
+        ArgumentsFixture f(row.text);
         ArgumentList arguments;
-        EXPECT_FALSE(collectArguments(f.sources, f.reporter, row.parameterCount, arguments));
+        EXPECT_FALSE(f.collector.collect(row.parameterCount, arguments));
         EXPECT_EQ(f.reporter.report(), row.message);
         EXPECT_EQ(f.rest(), row.rest);
     }
@@ -174,21 +181,20 @@ TEST(Arguments, MustBeClosedBeforeTheInputEnds) {
 }
 
 TEST(Arguments, MayReachThroughSeveralSources) {
-    SourceFixture f(", c) z");
+    ArgumentsFixture f(", c) z");
     f.pushText("b");
     f.pushText("(a ");
     ArgumentList arguments;
-    EXPECT_TRUE(collectArguments(f.sources, f.reporter, 2, arguments));
+    EXPECT_TRUE(f.collector.collect(2, arguments));
     EXPECT_EQ(textsOf(arguments), (Texts{"a b", "c"}));
     EXPECT_EQ(f.rest(), " z");
 }
 
 TEST(Arguments, EndWithAnIsolatedSource) {
-    SourceFixture f(") z");
-    Pieces pieces = f.piecesOf("(a");
-    f.sources.isolate(pieces);
+    ArgumentsFixture f(") z");
+    f.isolateText("(a");
     ArgumentList arguments;
-    EXPECT_FALSE(collectArguments(f.sources, f.reporter, 1, arguments));
+    EXPECT_FALSE(f.collector.collect(1, arguments));
     EXPECT_EQ(f.reporter.report(), kUnterminated);
     f.sources.endIsolation();
     EXPECT_EQ(f.rest(), ") z");
@@ -198,37 +204,39 @@ TEST(Arguments, HaveTheSetOfTheTokenThatEndsThem) {
     NoExpandSets sets;
     const Name name{"n"};
     const NoExpandSet set = sets.with({}, name);
-    SourceFixture f(", c)");
+    ArgumentsFixture f(", c)");
     f.pushText(", b", set);
     f.pushText("(a");
     ArgumentList arguments;
-    ASSERT_TRUE(collectArguments(f.sources, f.reporter, 3, arguments));
+    ASSERT_TRUE(f.collector.collect(3, arguments));
     EXPECT_EQ(arguments[0].noExpand, set);
     EXPECT_EQ(arguments[1].noExpand, NoExpandSet());
     EXPECT_EQ(arguments[2].noExpand, NoExpandSet());
 }
 
 TEST(Arguments, OfAnEarlierInvocationAreForgotten) {
-    SourceFixture f("(a, b)(c)()");
+    ArgumentsFixture f("(a, b)(c)()");
     ArgumentList arguments;
-    ASSERT_TRUE(collectArguments(f.sources, f.reporter, 2, arguments));
+    ASSERT_TRUE(f.collector.collect(2, arguments));
     arguments[0].state = Argument::Expansion::Known;
-    arguments[0].expansion.append(TokenKind::IDENTIFIER, "old", {});
-    ASSERT_TRUE(collectArguments(f.sources, f.reporter, 1, arguments));
+    arguments[0].expansion.append({TokenKind::IDENTIFIER, "old"}, {});
+    ASSERT_TRUE(f.collector.collect(1, arguments));
     EXPECT_EQ(textsOf(arguments), Texts{"c"});
     EXPECT_EQ(arguments[0].state, Argument::Expansion::Unknown);
-    ASSERT_TRUE(collectArguments(f.sources, f.reporter, 0, arguments));
+    ASSERT_TRUE(f.collector.collect(0, arguments));
     EXPECT_EQ(arguments.size(), 0U);
 }
 
 TEST(Arguments, ThatAreAddedAreEmpty) {
+    TextLexer lexer;
+    const SharedText text = lexer.lexed("a b");
     ArgumentList arguments;
-    arguments.add().text = "a";
-    arguments.add();
+    arguments.add(text).raw.last = 1;
+    arguments.add(text);
     EXPECT_EQ(textsOf(arguments), (Texts{"a", ""}));
     arguments.clear();
     EXPECT_EQ(arguments.size(), 0U);
-    arguments.add();
+    arguments.add(text);
     EXPECT_EQ(textsOf(arguments), Texts{""});
 }
 

@@ -20,7 +20,7 @@ using enum TokenKind;
 [[nodiscard]] std::string describe(const MacroBody& body, const BodyOperand& operand) {
     const std::string number = std::to_string(operand.index);
     switch (operand.kind) {
-    case BodyOperand::Kind::Token: return "'" + std::string(body.tokens.text(operand.index)) + "'";
+    case BodyOperand::Kind::Token: return "'" + std::string(body.tokens->text(operand.index)) + "'";
     case BodyOperand::Kind::RawArgument: return "raw " + number;
     case BodyOperand::Kind::Stringized: return "#" + number;
     }
@@ -32,7 +32,7 @@ using enum TokenKind;
     switch (step.kind) {
     case BodyStep::Kind::Tokens:
         for (std::size_t index = step.first; index < step.last; ++index) {
-            text += body.tokens.text(index);
+            text += body.tokens->text(index);
         }
         return "'" + text + "'";
     case BodyStep::Kind::Effects: {
@@ -64,10 +64,10 @@ using enum TokenKind;
     TextLexer lexer;
     MacroTable macros;
     const Macro& macro = defined(macros, {text, "x,y", true});
-    const std::shared_ptr<const MacroBody> body = bodyOf(macro, lexer);
+    const MacroBody& body = BodyMaker(lexer, macros).bodyOf(macro);
     std::string steps;
-    for (const BodyStep& step : body->steps) {
-        const std::string description = describe(*body, step);
+    for (const BodyStep& step : body.steps) {
+        const std::string description = describe(body, step);
         steps += (steps.empty() || description.empty() ? "" : ", ") + description;
     }
     return steps;
@@ -89,24 +89,49 @@ TEST(MacroBody, OfAnObjectLikeMacroIsItsTokens) {
     TextLexer lexer;
     MacroTable macros;
     const Macro& macro = defined(macros, {"a ## #x", "", false});
-    const std::shared_ptr<const MacroBody> body = bodyOf(macro, lexer);
-    EXPECT_EQ(lexemesOf(body->tokens), (testing::Lexemes{{IDENTIFIER, "a"},
-                                                         {WHITESPACE, " "},
-                                                         {PASTE, "##"},
-                                                         {WHITESPACE, " "},
-                                                         {HASH, "#"},
-                                                         {IDENTIFIER, "x"}}));
-    EXPECT_TRUE(body->steps.empty());
+    EXPECT_EQ(lexemesOf(*BodyMaker(lexer, macros).tokensOf(macro)),
+              (testing::Lexemes{{IDENTIFIER, "a"},
+                                {WHITESPACE, " "},
+                                {PASTE, "##"},
+                                {WHITESPACE, " "},
+                                {HASH, "#"},
+                                {IDENTIFIER, "x"}}));
 }
 
-TEST(MacroBody, IsMadeOnce) {
+TEST(MacroBody, OfAnObjectLikeMacroIsKeptFromTheSecondUseOn) {
     TextLexer lexer;
     MacroTable macros;
+    BodyMaker maker(lexer, macros);
+    const Macro& macro = defined(macros, {"x", "", false});
+    (void)maker.tokensOf(macro);
+    EXPECT_EQ(macro.body, nullptr);
+    const SharedText second = maker.tokensOf(macro);
+    const SharedText third = maker.tokensOf(macro);
+    EXPECT_EQ(&*second, &*third);
+}
+
+TEST(MacroBody, KnowsTheEntriesOfItsNames) {
+    TextLexer lexer;
+    MacroTable macros;
+    BodyMaker maker(lexer, macros);
+    const Macro& macro = defined(macros, {"M + other", "", false});
+    (void)maker.tokensOf(macro);
+    const SharedText tokens = maker.tokensOf(macro);
+    EXPECT_EQ(tokens->name(0), macros.find("M"));
+    EXPECT_EQ(tokens->name(2), nullptr);
+    EXPECT_EQ(tokens->name(4), macros.findEntry("other"));
+    EXPECT_FALSE(tokens->name(4)->isDefined);
+}
+
+TEST(MacroBody, OfAFunctionLikeMacroIsMadeOnce) {
+    TextLexer lexer;
+    MacroTable macros;
+    BodyMaker maker(lexer, macros);
     const Macro& macro = defined(macros, {"x", "x", true});
     EXPECT_EQ(macro.body, nullptr);
-    const MacroBody* const body = bodyOf(macro, lexer).get();
-    EXPECT_EQ(bodyOf(macro, lexer).get(), body);
-    EXPECT_EQ(macro.body.get(), body);
+    const MacroBody& body = maker.bodyOf(macro);
+    EXPECT_EQ(&maker.bodyOf(macro), &body);
+    EXPECT_EQ(macro.body.get(), &body);
 }
 
 TEST(MacroBody, WithoutParametersIsOneRunOfTokens) {
@@ -223,21 +248,21 @@ TEST(MacroBody, HoldsDirectiveWordsAsNames) {
     TextLexer lexer;
     MacroTable macros;
     const Macro& macro = defined(macros, {"line if", "line", true});
-    const std::shared_ptr<const MacroBody> body = bodyOf(macro, lexer);
-    ASSERT_EQ(body->steps.size(), 2U);
-    EXPECT_EQ(describe(*body, body->steps[0]), "argument 0");
-    EXPECT_EQ(describe(*body, body->steps[1]), "' if'");
+    const MacroBody& body = BodyMaker(lexer, macros).bodyOf(macro);
+    ASSERT_EQ(body.steps.size(), 2U);
+    EXPECT_EQ(describe(body, body.steps[0]), "argument 0");
+    EXPECT_EQ(describe(body, body.steps[1]), "' if'");
 }
 
 TEST(MacroBody, OfTwoParametersWithOneNameTakesTheLast) {
     TextLexer lexer;
     MacroTable macros;
     const Macro& macro = defined(macros, {"x # x x ## x", "x,x", true});
-    const std::shared_ptr<const MacroBody> body = bodyOf(macro, lexer);
-    ASSERT_EQ(body->steps.size(), 5U);
-    EXPECT_EQ(describe(*body, body->steps[0]), "argument 1");
-    EXPECT_EQ(describe(*body, body->steps[2]), "join(#1)");
-    EXPECT_EQ(describe(*body, body->steps[4]), "join(raw 1 + raw 1)");
+    const MacroBody& body = BodyMaker(lexer, macros).bodyOf(macro);
+    ASSERT_EQ(body.steps.size(), 5U);
+    EXPECT_EQ(describe(body, body.steps[0]), "argument 1");
+    EXPECT_EQ(describe(body, body.steps[2]), "join(#1)");
+    EXPECT_EQ(describe(body, body.steps[4]), "join(raw 1 + raw 1)");
 }
 
 TEST(MacroBody, CarriesOutTheEffectsOfACommentWhereItIsRead) {
@@ -255,9 +280,9 @@ TEST(MacroBody, KeepsTheSourceOnlyIfReadingItHasEffects) {
     TextLexer lexer;
     MacroTable macros;
     const Macro& plain = defined(macros, {"a /* b */ x", "x", true});
-    EXPECT_EQ(bodyOf(plain, lexer)->source.size(), 0U);
+    EXPECT_EQ(BodyMaker(lexer, macros).bodyOf(plain).source.size(), 0U);
     const Macro& withEffects = defined(macros, {"a /*\n*/ x", "x", true});
-    EXPECT_TRUE(bodyOf(withEffects, lexer)->source.hasEffects());
+    EXPECT_TRUE(BodyMaker(lexer, macros).bodyOf(withEffects).source.hasEffects());
 }
 
 }  // namespace

@@ -14,6 +14,8 @@
 namespace umpre {
 namespace {
 
+using enum TokenKind;
+
 using testing::MacroFixture;
 
 constexpr std::string_view kNotEnough = "There are not enough arguments in a macro invocation";
@@ -345,13 +347,20 @@ TEST(MacroExpander, GivesTheCurrentLineAndFile) {
 TEST(MacroExpander, TakesTheNewDefinitionOfANameAfterAChange) {
     MacroFixture f("N N N");
     f.define("N", "1");
-    EXPECT_EQ(f.sources.next().text, "N");
-    EXPECT_EQ(f.expander.expandName("N"), "");
+    EXPECT_EQ(f.expander.expandName(f.sources.next()), "1");
     f.define("N", "2");
-    EXPECT_EQ(f.sources.next().text, "1");
     EXPECT_EQ(f.expanded(), " 2 2");
     f.macros.undefine("N");
-    EXPECT_EQ(f.expander.expandName("N"), "N");
+    EXPECT_EQ(f.expander.expandName({IDENTIFIER, "N"}), "N");
+}
+
+TEST(MacroExpander, ReadsABodyOnThoughItsDefinitionChanges) {
+    MacroFixture f("N N");
+    f.define({{"F", {"x"}, "x"}});
+    f.define("N", "F(1) 2");
+    EXPECT_EQ(f.expander.expandName(f.sources.next()), "");
+    f.define("N", "3");
+    EXPECT_EQ(f.expanded(), "1 2 3");
 }
 
 // The tests below expand directive lines.

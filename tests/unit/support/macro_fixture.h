@@ -50,7 +50,7 @@ struct MacroFixture : SourceFixture {
         std::string result;
         for (Token token = sources.next(); token.kind != TokenKind::END_OF_INPUT;
              token = sources.next()) {
-            result.append(isName(token.kind) ? expander.expandName(token.text) : token.text);
+            result.append(isName(token.kind) ? expander.expandName(token) : token.text);
         }
         return result;
     }

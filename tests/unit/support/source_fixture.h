@@ -4,6 +4,7 @@
 
 #include <string>
 #include <string_view>
+#include <utility>
 
 #include "lex/output_writer.h"
 #include "lex/run_options.h"
@@ -43,7 +44,7 @@ private:
 /// A stack that reads a text as the file "main", with what it reports, writes and announces.
 struct SourceFixture {
     explicit SourceFixture(std::string_view text, const RunOptions& runOptions = {})
-        : options(runOptions), sources(fileEvents, output, reporter, options), lexer(options) {
+        : options(runOptions), lexer(options), sources(fileEvents, output, reporter, options) {
         fileEvents.watch(sources);
         output.redirect(sink);
         sources.pushFileText("main", text);
@@ -60,9 +61,14 @@ struct SourceFixture {
         return pieces;
     }
 
+    /// Reads a text on its own.
+    void isolateText(std::string_view text) {
+        sources.isolate(TextSlice::whole(lexer.lexed(text)), {});
+    }
+
     void pushText(std::string_view text, NoExpandSet noExpand = {}) {
         Pieces pieces = piecesOf(text, noExpand);
-        sources.pushPieces(pieces);
+        sources.pushPieces(std::move(pieces));
     }
 
     /// Returns what is left to be read, joined.
@@ -75,12 +81,12 @@ struct SourceFixture {
     }
 
     RunOptions options;
+    TextLexer lexer;
     RecordingSink sink;
     OutputWriter output;
     RecordingReporter reporter;
     RecordingFileEvents fileEvents;
     ScannerStack sources;
-    TextLexer lexer;
 };
 
 }  // namespace umpre::testing
