@@ -23,6 +23,7 @@ public:
     void read(Pieces&& pieces);
     /// Reads one piece.
     void read(TextSlice slice, NoExpandSet noExpand);
+
     /// Lets go of what it reads.
     void release() noexcept { text_ = {}; }
 

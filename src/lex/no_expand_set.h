@@ -94,7 +94,7 @@ private:
     std::unordered_map<Key, NoExpandSet, KeyHash> unions_;    // (set, set) to set
     Key lastUnited_{nullptr, nullptr};
     NoExpandSet lastUnion_;
-    const Node* marked_ = nullptr;                            // the set whose names are marked
+    const Node* marked_ = nullptr;  // the set whose names are marked
     std::vector<const Node*> path_;
 };
 

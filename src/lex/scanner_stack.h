@@ -139,6 +139,7 @@ private:
     [[nodiscard]] CppTokenScanner& pushList();
     void pop();
     void dropCurrent();
+
     void dropReadLists() {
         while (!sources_.back().isFile && !atFloor() && lists_[listsUsed_ - 1]->isExhausted()) {
             dropCurrent();

@@ -23,8 +23,8 @@ using enum TokenKind;
     return kind == INT_HEX || kind == UINT_HEX;
 }
 
-// Tells whether a number may go on with this character: a digit, the "x" of a hexadecimal number, or
-// a suffix.
+// Tells whether a number may go on with this character: a digit, the "x" of a hexadecimal number,
+// or a suffix.
 [[nodiscard]] bool numberGoesOn(TokenKind kind, char byte) noexcept {
     const char lower = static_cast<char>(byte | 0x20);
     const bool isDigit = byte >= '0' && byte <= '9';

@@ -1,9 +1,9 @@
 // SPDX-License-Identifier: MIT
 //
-// In F(F(F(x))) the argument of the outermost F is a slice of what is read, and while it is read the
-// argument of the next F is a slice of the same text, and so on. To look for the end of each anew
-// would cost the square of the depth, so an argument that is not short is looked through with the
-// outline of its text, which knows where each parenthesis is closed.
+// In F(F(F(x))) the argument of the outermost F is a slice of what is read, and while it is read
+// the argument of the next F is a slice of the same text, and so on. To look for the end of each
+// anew would cost the square of the depth, so an argument that is not short is looked through with
+// the outline of its text, which knows where each parenthesis is closed.
 #include "macros/argument_slices.h"
 
 #include "lex/text_outline.h"
