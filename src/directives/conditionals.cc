@@ -6,6 +6,7 @@
 namespace umpre {
 
 using enum TokenKind;
+using Outcome = DirectiveLine::Outcome;
 
 bool Conditionals::carryOut(TokenKind word) {
     switch (word) {
@@ -117,6 +118,80 @@ void Conditionals::decideByCondition() {
     if (sources_.peek() != END_OF_INPUT) {
         reporter_.reportError(kInvalidCharacters);
     }
+}
+
+// From bytes, nothing is done before it is clear that nothing has to be reported for the line; only
+// what its word alone leads to is.
+Outcome Conditionals::carryOut(DirectiveLine& line) {
+    switch (line.word()) {
+    case KW_IF:
+    case KW_IFDEF:
+    case KW_IFNDEF: return beginGroup(line);
+    case KW_ELIF: return beginBranch(line);
+    case KW_ELSE:
+    case KW_ENDIF:
+        line.skipBlanks();
+        if (!line.isAtEnd() || !line.isOneLine()) {
+            return Outcome::Untold;
+        }
+        carryOut(line.word());
+        return Outcome::EndLeft;
+    default: return Outcome::Untold;
+    }
+}
+
+Outcome Conditionals::beginGroup(DirectiveLine& line) {
+    if (groups_.skipping()) {
+        if (!line.skipRest()) {
+            return Outcome::Untold;
+        }
+        groups_.open();
+        line.takeEnd();
+        return Outcome::EndTaken;
+    }
+    const std::optional<bool> isTaken = condition(line);
+    if (!isTaken) {
+        return Outcome::Untold;
+    }
+    groups_.open();
+    groups_.decide(*isTaken);
+    return Outcome::EndLeft;
+}
+
+Outcome Conditionals::beginBranch(DirectiveLine& line) {
+    const GroupState state = groups_.groupState();
+    if (groups_.conditionalDepth() == 0 || state == GroupState::AfterElse) {
+        return Outcome::Untold;
+    }
+    if (state == GroupState::Seeking) {
+        const std::optional<bool> isTaken = condition(line);
+        if (isTaken) {
+            groups_.decide(*isTaken);
+        }
+        return isTaken ? Outcome::EndLeft : Outcome::Untold;
+    }
+    if (!line.skipRest()) {
+        return Outcome::Untold;
+    }
+    if (state == GroupState::Taking) {
+        groups_.passOver();
+    }
+    line.takeEnd();
+    return Outcome::EndTaken;
+}
+
+// Returns whether the line's branch is taken, or nothing if that cannot be told.
+std::optional<bool> Conditionals::condition(DirectiveLine& line) {
+    if (line.word() != KW_IFDEF && line.word() != KW_IFNDEF) {
+        return std::nullopt;
+    }
+    line.skipBlanks();
+    const Token name = line.next();
+    line.skipBlanks();
+    if (!isName(name.kind) || !line.isAtEnd()) {
+        return std::nullopt;
+    }
+    return (macros_.find(name.text) != nullptr) == (line.word() == KW_IFDEF);
 }
 
 }  // namespace umpre

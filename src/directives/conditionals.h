@@ -2,10 +2,12 @@
 #ifndef UMPRE_DIRECTIVES_CONDITIONALS_H
 #define UMPRE_DIRECTIVES_CONDITIONALS_H
 
+#include <optional>
 #include <string_view>
 
 #include "directives/conditional_stack.h"
 #include "expr/evaluator.h"
+#include "lex/directive_line.h"
 #include "lex/reporter.h"
 #include "lex/scanner_stack.h"
 #include "lex/text_lexer.h"
@@ -34,6 +36,9 @@ public:
     /// conditional one.
     bool carryOut(TokenKind word);
 
+    /// Carries out a conditional directive that was read as bytes up to its word.
+    [[nodiscard]] DirectiveLine::Outcome carryOut(DirectiveLine& line);
+
     /// A file begins, with no open groups.
     void enterFileGroups() { groups_.enterFile(); }
 
@@ -50,6 +55,11 @@ private:
     void endifDirective();
     [[nodiscard]] bool openGroup();
     void decideByCondition();
+
+    // For lines that are read as bytes.
+    [[nodiscard]] DirectiveLine::Outcome beginGroup(DirectiveLine& line);
+    [[nodiscard]] DirectiveLine::Outcome beginBranch(DirectiveLine& line);
+    [[nodiscard]] std::optional<bool> condition(DirectiveLine& line);
 
     ScannerStack& sources_;
     MacroTable& macros_;

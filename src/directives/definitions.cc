@@ -7,7 +7,42 @@
 
 namespace umpre {
 
+namespace {
+
 using enum TokenKind;
+using Outcome = DirectiveLine::Outcome;
+
+// Reads from "(" to ")" and adds the names to `parameters`, with commas between them. Returns null,
+// or an error with the offending token read.
+template <typename Tokens>
+[[nodiscard]] const char* readParameters(Tokens& tokens, std::string& parameters) {
+    const auto nextInList = [&tokens] {
+        tokens.skipBlanks();
+        return tokens.next();
+    };
+    (void)tokens.next();
+    Token token = nextInList();
+    if (token.kind == RIGHT_PARENTHESIS) {
+        return nullptr;
+    }
+    for (;;) {
+        if (!isName(token.kind)) {
+            return "An identifier is expected";
+        }
+        parameters.append(token.text);
+        token = nextInList();
+        if (token.kind == RIGHT_PARENTHESIS) {
+            return nullptr;
+        }
+        if (token.kind != COMMA) {
+            return "An ')' or ',' was expected";
+        }
+        parameters.push_back(',');
+        token = nextInList();
+    }
+}
+
+}  // namespace
 
 void Definitions::defineDirective() {
     const std::optional<std::string> name = readMacroName();
@@ -15,18 +50,19 @@ void Definitions::defineDirective() {
         return;
     }
     const bool functionLike = sources_.peek() == LEFT_PARENTHESIS;
-    std::optional<std::string> parameters = std::string();
+    parameters_.clear();
     if (functionLike) {
-        parameters = readParameters();
-        if (!parameters) {
+        const char* const error = readParameters(sources_, parameters_);
+        if (error != nullptr) {
+            reporter_.reportError(error);
             sources_.skipToEndOfLine();
             return;
         }
     }
     const std::string text = readReplacement();
-    if (macros_.define(*name, {text, *parameters, functionLike})
+    if (macros_.define(*name, {text, parameters_, functionLike})
         == MacroTable::Definition::Replaced) {
-        reporter_.reportWarning("Macro \"" + *name + "\" has an incompatible redefinition");
+        reportIncompatible(*name);
     }
     sources_.skipBlanks();
     sources_.next();
@@ -42,6 +78,48 @@ void Definitions::undefDirective() {
     sources_.next();
 }
 
+Outcome Definitions::defineDirective(DirectiveLine& line) {
+    line.skipBlanks();
+    const Token name = line.next();
+    if (!isName(name.kind)) {
+        return Outcome::Untold;
+    }
+    const bool functionLike = line.peekByte() == '(';
+    parameters_.clear();
+    if (functionLike && readParameters(line, parameters_) != nullptr) {
+        return Outcome::Untold;
+    }
+    line.skipBlanks();
+    const std::optional<std::string_view> text = line.readText(text_);
+    if (!text) {
+        return Outcome::Untold;
+    }
+    const MacroTable::Definition definition =
+        macros_.define(name.text, {*text, parameters_, functionLike});
+    line.takeEnd();
+    if (definition == MacroTable::Definition::Replaced) {
+        reportIncompatible(name.text);
+    }
+    return Outcome::EndTaken;
+}
+
+Outcome Definitions::undefDirective(DirectiveLine& line) {
+    line.skipBlanks();
+    const Token name = line.next();
+    line.skipBlanks();
+    if (!isName(name.kind) || !line.isAtEnd()) {
+        return Outcome::Untold;
+    }
+    macros_.undefine(name.text);
+    line.takeEnd();
+    return Outcome::EndTaken;
+}
+
+void Definitions::reportIncompatible(std::string_view name) {
+    reporter_.reportWarning(
+        std::string("Macro \"").append(name).append("\" has an incompatible redefinition"));
+}
+
 std::optional<std::string> Definitions::readMacroName() {
     sources_.skipBlanks();
     const Token token = sources_.next();
@@ -50,38 +128,6 @@ std::optional<std::string> Definitions::readMacroName() {
         return std::nullopt;
     }
     return std::string(token.text);
-}
-
-// Reads from "(" to ")" and returns the names, with commas between them. Returns nothing after
-// reporting an error, the offending token read.
-std::optional<std::string> Definitions::readParameters() {
-    std::string parameters;
-    const auto nextInList = [this] {
-        sources_.skipBlanks();
-        return sources_.next();
-    };
-    sources_.next();
-    Token token = nextInList();
-    if (token.kind == RIGHT_PARENTHESIS) {
-        return parameters;
-    }
-    for (;;) {
-        if (!isName(token.kind)) {
-            reporter_.reportError("An identifier is expected");
-            return std::nullopt;
-        }
-        parameters.append(token.text);
-        token = nextInList();
-        if (token.kind == RIGHT_PARENTHESIS) {
-            return parameters;
-        }
-        if (token.kind != COMMA) {
-            reporter_.reportError("An ')' or ',' was expected");
-            return std::nullopt;
-        }
-        parameters.push_back(',');
-        token = nextInList();
-    }
 }
 
 std::string Definitions::readReplacement() {

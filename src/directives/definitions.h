@@ -4,7 +4,9 @@
 
 #include <optional>
 #include <string>
+#include <string_view>
 
+#include "lex/directive_line.h"
 #include "lex/reporter.h"
 #include "lex/scanner_stack.h"
 #include "macros/macro_table.h"
@@ -23,14 +25,20 @@ public:
     /// Reads the name and one token more, whatever it is.
     void undefDirective();
 
+    /// Carry out a directive that was read as bytes up to its word.
+    [[nodiscard]] DirectiveLine::Outcome defineDirective(DirectiveLine& line);
+    [[nodiscard]] DirectiveLine::Outcome undefDirective(DirectiveLine& line);
+
 private:
     [[nodiscard]] std::optional<std::string> readMacroName();
-    [[nodiscard]] std::optional<std::string> readParameters();
     [[nodiscard]] std::string readReplacement();
+    void reportIncompatible(std::string_view name);
 
     ScannerStack& sources_;
     MacroTable& macros_;
     Reporter& reporter_;
+    std::string parameters_;
+    std::string text_;
 };
 
 }  // namespace umpre

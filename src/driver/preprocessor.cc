@@ -79,17 +79,46 @@ bool Preprocessor::readBytes() {
     }
     if (conditionals_.skipping()) {
         if (textReader_.skipText(*file) == TextReader::Stop::LineStart) {
-            return false;
+            return readDirective(*file);
         }
         endSkippedLine();
     } else {
         if (textReader_.copyText(*file, TextReader::Stop::LineStart)
             == TextReader::Stop::LineStart) {
-            return false;
+            return readDirective(*file);
         }
         restOfTextLine();
     }
     return true;
+}
+
+// Reads the next line if it is a directive that its bytes tell. Returns false, with nothing read,
+// if not.
+bool Preprocessor::readDirective(CppFileScanner& file) {
+    DirectiveLine line(file);
+    const DirectiveLine::Outcome outcome = carryOut(line);
+    if (outcome == DirectiveLine::Outcome::EndLeft) {
+        line.takeEnd();
+        output_.endLine();
+    }
+    return outcome != DirectiveLine::Outcome::Untold;
+}
+
+DirectiveLine::Outcome Preprocessor::carryOut(DirectiveLine& line) {
+    const TokenKind word = line.word();
+    const bool isConditional = word >= KW_IF && word <= KW_ENDIF;
+    if (isConditional) {
+        return conditionals_.carryOut(line);
+    }
+    if (conditionals_.skipping()) {
+        return isName(word) && line.skipRest() ? DirectiveLine::Outcome::EndLeft
+                                               : DirectiveLine::Outcome::Untold;
+    }
+    switch (word) {
+    case KW_DEFINE: return definitions_.defineDirective(line);
+    case KW_UNDEF: return definitions_.undefDirective(line);
+    default: return DirectiveLine::Outcome::Untold;
+    }
 }
 
 // Returns the file that can be read as bytes now, or null.

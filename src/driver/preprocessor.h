@@ -11,6 +11,7 @@
 #include "directives/line_control.h"
 #include "driver/diagnostics.h"
 #include "lex/byte_sink.h"
+#include "lex/directive_line.h"
 #include "lex/output_writer.h"
 #include "lex/run_options.h"
 #include "lex/scanner_stack.h"
@@ -68,6 +69,8 @@ private:
 
     [[nodiscard]] RunResult readAll();
     [[nodiscard]] bool readBytes();
+    [[nodiscard]] bool readDirective(CppFileScanner& file);
+    [[nodiscard]] DirectiveLine::Outcome carryOut(DirectiveLine& line);
     [[nodiscard]] CppFileScanner* byteSource();
     void line();
     void directiveLine();

@@ -79,13 +79,13 @@ Token CppLexer::lex() {
 // is unclosed is found only once: a later quote of that kind before the same line end was passed by
 // the first attempt as half of an escaped pair, so its own attempt would go the same way.
 std::size_t CppLexer::literalSize(const char* quote) {
-    const char*& unclosedUntil = *quote == '"' ? unclosedString_ : unclosedCharacter_;
-    if (quote < unclosedUntil) {
+    Unclosed& unclosed = *quote == '"' ? unclosedStrings_ : unclosedCharacters_;
+    if (quote >= unclosed.begin && quote < unclosed.end) {
         return 0;
     }
     const LiteralScan literal = scanLiteral(quote, end_);
     if (!literal.isClosed) {
-        unclosedUntil = literal.end;
+        unclosed = {quote, literal.end};
         return 0;
     }
     return static_cast<std::size_t>(literal.end - quote);

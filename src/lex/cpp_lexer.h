@@ -68,9 +68,15 @@ private:
     InputBuffer* input_ = nullptr;  // null while a text is scanned
     char* end_ = nullptr;           // of the bytes in memory
     char* lineLimit_ = nullptr;     // of the whole lines among them
-    // Up to where quotes of each kind are known to be unclosed.
-    const char* unclosedString_ = nullptr;
-    const char* unclosedCharacter_ = nullptr;
+
+    // Between which places quotes of each kind are known to be unclosed.
+    struct Unclosed {
+        const char* begin = nullptr;
+        const char* end = nullptr;
+    };
+
+    Unclosed unclosedStrings_;
+    Unclosed unclosedCharacters_;
     bool plainRoad_;
     std::int32_t line_ = 1;
 };

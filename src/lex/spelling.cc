@@ -42,6 +42,22 @@ constexpr std::size_t kLongestWord = 7;
     return at;
 }
 
+constexpr std::string_view kPunctuators = "#(),?:|^&<>+-*/%!~";
+
+// Returns the kind of a punctuator of two characters, or OTHER if these are none.
+[[nodiscard]] TokenKind kindOfPair(char first, char second) noexcept {
+    switch (first) {
+    case '#': return second == '#' ? PASTE : OTHER;
+    case '|': return second == '|' ? OROR : OTHER;
+    case '&': return second == '&' ? ANDAND : OTHER;
+    case '=': return second == '=' ? EQ : OTHER;
+    case '!': return second == '=' ? NE : OTHER;
+    case '<': return second == '=' ? LE : second == '<' ? LSHIFT : OTHER;
+    case '>': return second == '=' ? GE : second == '>' ? RSHIFT : OTHER;
+    default: return OTHER;
+    }
+}
+
 }  // namespace
 
 TokenKind kindOfName(std::string_view name) noexcept {
@@ -91,6 +107,23 @@ Token numberAt(const char* at) noexcept {
     bool isUnsigned = false;
     end = suffixEnd(end, isUnsigned);
     return {isUnsigned ? unsignedKind : kind, {at, static_cast<std::size_t>(end - at)}};
+}
+
+Token tokenAt(const char* at) noexcept {
+    if (isNameStart(*at)) {
+        const std::string_view name(at, static_cast<std::size_t>(nameEnd(at) - at));
+        return {kindOfName(name), name};
+    }
+    if (isDigit(*at)) {
+        return numberAt(at);
+    }
+    const TokenKind pair = kindOfPair(*at, at[1]);
+    if (pair != OTHER) {
+        return {pair, {at, 2}};
+    }
+    const bool isComment = *at == '/' && (at[1] == '/' || at[1] == '*');
+    const bool isPunctuator = kPunctuators.find(*at) != std::string_view::npos && !isComment;
+    return {isPunctuator ? static_cast<TokenKind>(*at) : OTHER, {at, 1}};
 }
 
 }  // namespace umpre

@@ -8,8 +8,8 @@
 
 namespace umpre {
 
-// How names and numbers are spelled, for readers of bytes. Each function reads up to the first byte
-// that does not belong to what it reads.
+// How tokens are spelled, for readers of bytes. Each function reads up to the first byte that does
+// not belong to what it reads.
 
 [[nodiscard]] constexpr bool isDigit(char byte) noexcept {
     return byte >= '0' && byte <= '9';
@@ -33,6 +33,10 @@ namespace umpre {
 
 /// Returns the number that begins at `at` with a digit, as the number rules split it.
 [[nodiscard]] Token numberAt(const char* at) noexcept;
+
+/// Returns the token that begins at `at`: a name, a number or a punctuator. What begins anything
+/// else, a comment or a literal too, is one byte of the kind OTHER.
+[[nodiscard]] Token tokenAt(const char* at) noexcept;
 
 }  // namespace umpre
 

@@ -316,6 +316,72 @@ TEST(Roads, AgreeOnLineControl) {
     });
 }
 
+TEST(Roads, AgreeOnDefinitions) {
+    expectSameOnAllRoads({
+        "#define M\nM N\n#define M \nM N\n#define M(x)\nM(N) N\n",
+        "#  define  M  a  b\t c\v\f d \t\n[M]\n",
+        "#define M \"a  b\" 'c  d'  \"e  f\n[M]\n",
+        "#define M\"a\r\"\"\r\nM\n",
+        "#define M \"a\r  b\"  c\nM\n#define M 'a  b\n[M]\n",
+        "#define M a /* b */ c /**/d// e\n[M]\n",
+        "#define M a /* b\nc */ d\n[M]\n#define M a /* no end\n",
+        "#define M a / * b / / c /= d\n[M]\n#define M // a\n[M]\n#define M/**/a\n[M]\n",
+        "#define M a\\\nb \\\n c\\\n\\\n d \\\n\n[M]\n",
+        "#define \\\nM\\\n(x)\\\nx\n[M]\n#\\\ndefine M 2\nM\n",
+        "#define M a \\\nb // c \\\n[M]\n#define M a \\b \\\\ \\\r\nc\n[M]\n",
+        "#define M a/\\\n/b /\\\n* c\nM\n*/ N\n",
+        "#define M 1\n#define M  1\n#define M 2\n#define M 2 \\\n\\\n3\nM\n",
+        "#define N 3\n#define N\n#define N() 3\n#define F(y) [x]\nN F(1)\n",
+        "#define M(a,b)a b\n#define L( a , b )  a  b \n#define K()k\n#define J( "
+        ")\nM(1,2)L(1,2)K()J()\n",
+        "#define M(a,/* b */c\\\n,d // e\nN\n#define M(a,/* b */c\\\n,d) a c d\nM(1,2,3)\n",
+        "#define M(\nN\n#define M(,\nN\n#define M(a\nN\n#define M(a,\nN\n#define M(a,)\nN\n",
+        "#define M(a b)\nN\n#define M(a...)\nN\n#define M(1)\nN\n#define M(defined)\nN\n",
+        "#define M(a\r,b)\nN\n#define M(if,else) if else\nM(1,2)\n",
+        "#define if 1\n#define define 2\n#define line 3\nif define line\n#if if\nN\n#endif\n",
+        "#define defined 1\nN\n#define 1 N\nN\n#define\nN\n#define \"M\"\nN\n#define (a)\nN\n",
+        "#define M#\n#define L##\n#define K-1\n#define J\xE9 1\nM L K J\n",
+        "#define M \0 a\0  b\0\nM\n#define M\0 2\nM\n"s,
+        "#define __LINE__ 5\n__LINE__\n#define __FILE__ __LINE__\n__FILE__\n",
+        "#undef N\nN\n#undef N N\nN\n#undef F/* a */// b\nF(1)\n#undef\nN\n#undef 1\nN\n",
+        "#undef H /* a\nb */\nH(1,2)\n#undef S \\\n\\\n N\nN\n# undef\tM \nM\n",
+        "#undef defined\n#undef __LINE__\n__LINE__\n#undef G\r\nG()\n#undef if\n",
+        "#define M 1",
+        "#define M 1 \\\n",
+        "#define M 1 \\",
+        "#define M \"",
+        "#undef N",
+    });
+}
+
+TEST(Roads, AgreeOnConditionalLines) {
+    expectSameOnAllRoads({
+        "#ifdef N\nN\n#else\nno\n#endif\n#ifndef N\nno\n#else\nN\n#endif\nN\n",
+        " # ifdef/**/M // a\nno\n\t#\telse /* b */ \nN\n#endif/* c */\nN\n",
+        "#ifdef N /* a\nb */\nN\n#else /* c\nd */ N\nno\n#endif /* e\n*/\nN\n",
+        "#ifdef \\\nN\nN\n#\\\nelse\nno\n#endif \\\n\nN\n#else \\\nN\n#\\\n\\\nendif\n",
+        "#ifdef N M\nN\n#endif N\nN\n#ifdef\n#endif\n#ifndef 1\n#endif\n#ifdef defined\n#endif\n",
+        "#ifdef N\r\nN\r\n#else\r\nno\r\n#endif\r\nN\r\n",
+        "#ifdef \"N\n#endif\"\nN\n#ifdef N\"\nN\n#endif'\nN\n",
+        "#if 0\n#if \"\n#elif /* a\n#else */\n#elif \"/*\"\n#else\n#endif\n#endif\nN\n",
+        "#if 0\n#ifdef N \\\n#endif\n#endif // \\\n#endif\nN\n#endif\nN\n",
+        "#if 0\n#define N \\\n#endif\n#define \"/*\n#error it's\n#pragma // "
+        "\\\n#endif\nN\n#endif\n",
+        "#if 0\n#foo\n#endif\nN\n#if 0\n#foo \\\n#endif\n#endif\nN\n#if 0\n#1\n#defined\n#endif\n",
+        "#if 1\nN\n#elif \"\n#elif /* a\n*/\n#elif N \\\n#endif\n#elif 1/0\n#else\n#elif\n#endif\n",
+        "#if 1\n#else\n#else\n#elif 1\n#endif\n#\\\nelse\n#\\\nendif\n#else // a\n#endif /* b "
+        "*/\n#elif 1\n",
+        "#if 0\n#else\n#elif 1\nN\n#else\nN\n#endif\nN\n#endif",
+        "#if 0\n#if 1\n#elif 1\n#else\n#elif 1\n#else\n#endif\n#elif 1\nN\n#elif "
+        "1\nno\n#else\nno\n#endif\n",
+        "#ifdef N\n#ifdef M\n#ifdef N\nno\n#endif\n#else\nN\n#endif\n#endif\nN\n\n\nN\n",
+        "#ifdef N",
+        "#ifndef N\n#else",
+        "#ifdef N\n#endif",
+        "#ifdef N\n#endif \\",
+    });
+}
+
 TEST(Roads, AgreeOnConditions) {
     expectSameOnAllRoads({
         "#if N == 3 && defined(N) && !defined X\nN\n#else\nno\n#endif\n",

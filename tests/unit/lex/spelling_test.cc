@@ -55,5 +55,27 @@ TEST(Spelling, SplitsNumbersAsTheRulesDo) {
     }
 }
 
+TEST(Spelling, TellsNamesNumbersAndPunctuators) {
+    for (const std::string text :
+         {"if(", "x1+", "07uL)", "#",  "##", "###", "(",  ")",   ",", "?",  ":",  "|",   "||",
+          "|||", "^",   "&",     "&&", "==", "!",   "!=", "!==", "<", "<=", "<<", "<<=", ">",
+          ">=",  ">>",  "+",     "++", "-",  "->",  "*",  "*/",  "/", "/=", "%",  "~"}) {
+        LexedText lexed;
+        const Token expected = firstToken(lexed, text);
+        const Token token = tokenAt(text.data());
+        EXPECT_EQ(token.kind, expected.kind) << text;
+        EXPECT_EQ(token.text, expected.text) << text;
+    }
+}
+
+TEST(Spelling, TakesOneByteOfWhatItDoesNotTell) {
+    for (const std::string text : {"\"a\"", "'a'", "//", "/* a */", "=", " ", "\\\n", "\n", "\r",
+                                   "", "\xE9", ".", "@", "$a"}) {
+        const Token token = tokenAt(text.c_str());
+        EXPECT_EQ(token.kind, TokenKind::OTHER) << text;
+        EXPECT_EQ(token.text, std::string_view(text.c_str(), 1)) << text;
+    }
+}
+
 }  // namespace
 }  // namespace umpre
