@@ -32,7 +32,7 @@ enum class LineKind {
 class MacroExpander {
 public:
     MacroExpander(ScannerStack& sources, MacroTable& macros, Reporter& reporter,
-                  TextLexer& lexer) noexcept
+                  TextLexer& lexer)
         : sources_(sources),
           macros_(macros),
           reporter_(reporter),
