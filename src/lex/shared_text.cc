@@ -4,8 +4,7 @@
 namespace umpre {
 namespace {
 
-// Deep nesting needs many texts at a time, and a few are very long; neither is kept for ever.
-constexpr std::size_t kSpares = 64;
+// A few texts are very long; they are not kept for ever.
 constexpr std::size_t kLargest = std::size_t{1} << 20U;
 
 }  // namespace
@@ -13,7 +12,8 @@ constexpr std::size_t kLargest = std::size_t{1} << 20U;
 void SharedText::giveBack() noexcept {
     std::unique_ptr<Counted> counted(counted_);
     TextPool* const pool = counted->pool;
-    if (pool != nullptr && pool->spare_.size() < kSpares && counted->text.size() < kLargest) {
+    if (pool != nullptr && pool->spare_.size() < TextPool::kSpares
+        && counted->text.size() < kLargest) {
         counted->text.clear();
         pool->spare_.push_back(std::move(counted));
     }

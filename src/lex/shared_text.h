@@ -74,6 +74,9 @@ private:
 /// the texts taken from it.
 class TextPool {
 public:
+    /// Takes the room for the spare texts, because giving one back must not ask for memory.
+    TextPool() { spare_.reserve(kSpares); }
+
     /// Returns an empty text.
     [[nodiscard]] SharedText take() {
         if (spare_.empty()) {
@@ -89,6 +92,9 @@ public:
 
 private:
     friend class SharedText;
+
+    // Deep nesting needs more texts at a time, but not for long.
+    static constexpr std::size_t kSpares = 64;
 
     std::vector<std::unique_ptr<SharedText::Counted>> spare_;
 };
