@@ -31,8 +31,7 @@ enum class LineKind {
 /// so whoever reads on reads it, and brings its names back here.
 class MacroExpander {
 public:
-    MacroExpander(ScannerStack& sources, MacroTable& macros, Reporter& reporter,
-                  TextLexer& lexer)
+    MacroExpander(ScannerStack& sources, MacroTable& macros, Reporter& reporter, TextLexer& lexer)
         : sources_(sources),
           macros_(macros),
           reporter_(reporter),
