@@ -23,7 +23,9 @@ import sys
 from workloads import WORKLOADS
 
 ROOT = pathlib.Path(__file__).resolve().parent.parent
+# Stands for the code that makes the inputs: they are made anew when it has changed.
 SOURCES = sorted(pathlib.Path(__file__).resolve().parent.glob("workloads/*.py"))
+MADE_BY = hashlib.sha256(b"".join(path.read_bytes() for path in SOURCES)).hexdigest()
 
 
 class Folder:
@@ -49,13 +51,12 @@ def generate(workload, scale=1.0, into=None):
     """Writes a workload's files unless they are there. Returns their folder."""
     place = place_of(workload, scale, into)
     stamp = place / ".made-by"
-    made_by = hashlib.sha256(b"".join(path.read_bytes() for path in SOURCES)).hexdigest()
-    if not stamp.exists() or stamp.read_text() != made_by:
+    if not stamp.exists() or stamp.read_text() != MADE_BY:
         print(f"Writing {place} ...", file=sys.stderr)
         shutil.rmtree(place, ignore_errors=True)
         place.mkdir(parents=True)
         WORKLOADS[workload](Folder(place), random.Random(workload), scale)
-        stamp.write_text(made_by)
+        stamp.write_text(MADE_BY)
     return place
 
 

@@ -15,6 +15,7 @@ build_packages=(
 )
 test_packages=(
     "python3|python3|runs the golden cases"
+    "time|/usr/bin/time|takes the memory of a program, which a shell cannot"
     "libgtest-dev|/usr/include/gtest/gtest.h|the unit tests' framework"
     "zlib1g-dev|/usr/include/zlib.h|headers to preprocess"
     "libbz2-dev|/usr/include/bzlib.h|headers to preprocess"

@@ -2,7 +2,7 @@
 """Workloads that are mostly text to copy or to skip."""
 
 from .conditions import Expressions
-from .words import Writer
+from .words import Pool, Writer
 
 MB = 1_000_000
 
@@ -16,7 +16,7 @@ def plain(folder, rng, scale):
     def name():
         return rng.choice(uses) if rng.random() < 0.01 else rng.choice(writer.names)
 
-    pool = writer.code_lines(20000, name)
+    pool = writer.code_lines(10000, name)
     folder.write("main.c", "\n".join(head) + "\n" + writer.fill(pool, 24 * MB * scale))
 
 
@@ -53,8 +53,8 @@ def items(writer, count):
 def data(folder, rng, scale):
     """Initialisers on many lines, numbers and strings."""
     writer = Writer(rng, 500)
-    every = items(writer, 60000)
-    lines = ["    " + ", ".join(rng.sample(every, 3)) + ",\n" for _ in range(20000)]
+    every = items(writer, 20000)
+    lines = ["    " + ", ".join(rng.sample(every, 3)) + ",\n" for _ in range(10000)]
     text = writer.fill(lines, 24 * MB * scale)
     folder.write("main.c", "static const struct row table[] = {\n" + text + "};\n")
 
@@ -62,7 +62,7 @@ def data(folder, rng, scale):
 def oneline(folder, rng, scale):
     """The same in one line."""
     writer = Writer(rng, 500)
-    text = writer.fill([item + ", " for item in items(writer, 60000)], 16 * MB * scale)
+    text = writer.fill([item + ", " for item in items(writer, 20000)], 16 * MB * scale)
     folder.write("main.c", "static const struct row table[] = { " + text + "};\n")
 
 
@@ -87,13 +87,13 @@ def line_comment(writer):
 def comments(folder, rng, scale):
     """Block and line comments, 85 % of the bytes, among code."""
     writer = Writer(rng)
-    blocks = [block_comment(writer) for _ in range(4000)]
-    single = ["".join(line_comment(writer) for _ in range(rng.randint(1, 6))) for _ in range(4000)]
-    code = [line for line in writer.code_lines(8000) if "/*" not in line]
-    comment = sum(map(len, blocks + single)) / 8000
+    blocks = [block_comment(writer) for _ in range(2000)]
+    single = ["".join(line_comment(writer) for _ in range(rng.randint(1, 6))) for _ in range(2000)]
+    code = Pool(rng, [line for line in writer.code_lines(4000) if "/*" not in line])
+    comment = sum(map(len, blocks + single)) / 4000
     # So many bytes of code behind a comment that 85 % are comment.
     behind = comment * 15 / 85
-    runs = [writer.fill(code, behind * rng.uniform(0.5, 1.5)) for _ in range(8000)]
+    runs = [code.text(behind * rng.uniform(0.5, 1.5)) for _ in range(4000)]
     pool = [text + run for text, run in zip(blocks + single, runs)]
     folder.write("main.c", writer.fill(pool, 64 * MB * scale))
 
@@ -135,9 +135,9 @@ def conditions(folder, rng, scale):
     """Chains of #if and #elif with arithmetic and `defined`; 95 % of the text is skipped."""
     writer = Writer(rng)
     expressions = Expressions(rng)
-    true, false = expressions.sorted_by_value(4000)
-    lines = writer.code_lines(10000)
-    bodies = [writer.fill(lines, rng.uniform(180, 540)) for _ in range(4000)]
+    true, false = expressions.sorted_by_value(2000)
+    lines = Pool(rng, writer.code_lines(5000))
+    bodies = [lines.text(rng.uniform(180, 540)) for _ in range(2000)]
     text = [expressions.definitions()]
     count = 0
     while count < 80000 * scale:

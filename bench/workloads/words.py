@@ -110,7 +110,19 @@ class Writer:
         name = name or (lambda: self.rng.choice(self.names))
         return [self.code_line(name) for _ in range(count)]
 
-    def fill(self, pool, size):
-        """Returns a text of about so many bytes, made of members of the pool."""
-        mean = sum(map(len, pool)) / len(pool)
-        return "".join(self.rng.choices(pool, k=max(1, round(size / mean))))
+    def fill(self, members, size):
+        """Returns a text of about so many bytes, made of these members."""
+        return Pool(self.rng, members).text(size)
+
+
+class Pool:
+    """Texts of which larger ones are made."""
+
+    def __init__(self, rng, members):
+        self.rng = rng
+        self.members = members
+        self.mean = sum(map(len, members)) / len(members)
+
+    def text(self, size):
+        """Returns a text of about so many bytes, made of the pool's members."""
+        return "".join(self.rng.choices(self.members, k=max(1, round(size / self.mean))))
