@@ -22,6 +22,7 @@ test_packages=(
     "libexpat1-dev|/usr/include/expat.h|headers to preprocess"
     "liblzma-dev|/usr/include/lzma.h|headers to preprocess"
     "libpng-dev|/usr/include/png.h|headers to preprocess"
+    "pkg-config|pkg-config|flags to build with the library"
     "libsqlite3-dev|/usr/include/sqlite3.h|headers to preprocess"
 )
 

@@ -1,14 +1,14 @@
 #!/usr/bin/env python3
 # SPDX-License-Identifier: MIT
-"""Checks who includes whom under src/ against docs/architecture.md.
+"""Checks who includes whom under src/ and include/ against docs/architecture.md.
 
 A component is a file without its suffix: lex/token is lex/token.h with lex/token.cc. The page has a
 heading for each folder (### `lex/`) and below it a table that lists the folder's components in its
 first column, each below what it includes. The rules:
 
 - every component is listed, and everything listed exists;
-- a folder includes itself and folders further left in the order lex, macros, expr, directives,
-  driver, lines;
+- a folder includes itself and folders further left in the order umpre (the public headers), lex,
+  macros, expr, directives, driver, api, lines;
 - inside a folder a component includes only what stands above it, which makes cycles impossible.
 """
 
@@ -17,8 +17,8 @@ import re
 import sys
 
 ROOT = pathlib.Path(__file__).resolve().parent.parent
-FOLDERS = ["lex", "macros", "expr", "directives", "driver", "lines"]
-SUFFIXES = {".h", ".cc", ".l"}
+FOLDERS = ["umpre", "lex", "macros", "expr", "directives", "driver", "api", "lines"]
+SUFFIXES = {".h", ".in", ".cc", ".l"}
 HEADING = re.compile(r"#+ `([a-z]+)/`")
 ROW = re.compile(r"\| *`([a-z_]+)`")
 INCLUDE = re.compile(r'^ *# *include +"([^"]+)"', re.MULTILINE)
@@ -36,12 +36,12 @@ def listed_components(page):
     return found
 
 
-def included_components(source):
-    """Returns, for each component under `source`, the components that it includes."""
+def included_components(*sources):
+    """Returns, for each component under `sources`, the components that it includes."""
     found = {}
-    for path in sorted(source.rglob("*")):
+    for source, path in sorted((source, path) for source in sources for path in source.rglob("*")):
         if path.suffix in SUFFIXES:
-            name = path.relative_to(source).with_suffix("").as_posix()
+            name = path.relative_to(source).as_posix().partition(".")[0]
             for target in INCLUDE.findall(path.read_text(encoding="utf-8")):
                 found.setdefault(name, set()).add(target.rpartition(".")[0])
             found.setdefault(name, set()).discard(name)
@@ -67,7 +67,7 @@ def complaints(listed, included):
 
 def main():
     listed = listed_components(ROOT / "docs" / "architecture.md")
-    included = included_components(ROOT / "src")
+    included = included_components(ROOT / "include", ROOT / "src")
     breaches = list(complaints(listed, included))
     print("\n".join(breaches + [f"layers: {len(included)} components, {len(breaches)} breaches"]))
     return 1 if breaches or not included else 0

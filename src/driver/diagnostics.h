@@ -9,22 +9,23 @@
 #include "lex/byte_sink.h"
 #include "lex/reporter.h"
 #include "lex/scanner_stack.h"
+#include "umpre/diagnostic.h"
 
 namespace umpre {
 
-/// The form of a message: file, line, weight, text, period; and whether there was an error. Each
-/// message is written at once; that the sink fails is ignored.
+/// Gives problems their place and their weight and hands them on at once; and tells whether there
+/// was an error.
 class Diagnostics final : public Reporter {
 public:
-    Diagnostics(ByteSink& sink, const ScannerStack& sources) noexcept
-        : sink_(sink), sources_(sources) {}
+    /// An empty sink drops them.
+    Diagnostics(DiagnosticSink sink, const ScannerStack& sources);
 
     void reportError(std::string_view message) override;
     void reportWarning(std::string_view message) override;
     /// Reports a problem that ends the run. Before a file is open it has no position.
     void reportFatal(std::string_view message);
     void noteUnterminatedComment(std::int32_t line) override;
-    /// Writes the scanner's own message, which has no position.
+    /// Hands on the scanner's own message.
     void noteScannerFailure(std::string_view message);
 
     [[nodiscard]] std::size_t reportCount() const override { return reportCount_; }
@@ -32,13 +33,18 @@ public:
     [[nodiscard]] bool errorFlag() const noexcept { return errorFlag_; }
 
 private:
-    void report(std::string_view weight, std::string_view message);
+    void report(Severity severity, std::string_view message);
+    void handOn(const Diagnostic& diagnostic) const;
+    [[nodiscard]] SourcePosition position() const;
 
-    ByteSink& sink_;
+    DiagnosticSink sink_;
     const ScannerStack& sources_;
     std::size_t reportCount_ = 0;
     bool errorFlag_ = false;
 };
+
+/// Returns a sink that writes each problem as a line to a borrowed one; that this fails is ignored.
+[[nodiscard]] DiagnosticSink linesTo(ByteSink& sink);
 
 }  // namespace umpre
 

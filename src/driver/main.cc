@@ -5,6 +5,7 @@
 #include <unistd.h>
 
 #include "driver/command_line.h"
+#include "driver/diagnostics.h"
 #include "driver/output_file.h"
 #include "driver/preprocessor.h"
 #include "driver/standard_descriptors.h"
@@ -44,7 +45,7 @@ int preprocess(int argc, char** argv) {
     umpre::OutputFile output;
     umpre::RunOptions options;
     options.plainRoad = UMPRE_PLAIN_ROAD;
-    umpre::Preprocessor preprocessor(errors, options);
+    umpre::Preprocessor preprocessor(umpre::linesTo(errors), options);
     auto result = umpre::RunResult::Errors;
     if (umpre::parseCommandLine(preprocessor, {output, errors}, argc, argv)) {
         result = preprocessor.run();

@@ -2,6 +2,7 @@
 #include "driver/preprocessor.h"
 
 #include <new>
+#include <utility>
 
 #include "expr/expr_value.h"
 #include "lex/scanner_failure.h"
@@ -11,11 +12,11 @@ namespace umpre {
 
 using enum TokenKind;
 
-Preprocessor::Preprocessor(ByteSink& errors, const RunOptions& options)
+Preprocessor::Preprocessor(DiagnosticSink diagnostics, const RunOptions& options)
     : options_(options),
       lexer_(options),
       sources_(*this, output_, diagnostics_, options),
-      diagnostics_(errors, sources_),
+      diagnostics_(std::move(diagnostics), sources_),
       expander_(sources_, macros_, diagnostics_, lexer_),
       conditionals_(sources_, macros_, expander_, lexer_, diagnostics_),
       definitions_(sources_, macros_, diagnostics_),

@@ -33,8 +33,9 @@ enum class RunResult {
 /// One run: reads the source from its first token to the end of the input and writes the result.
 class Preprocessor final : private FileEvents {
 public:
-    /// The sinks are borrowed. The predefined macros take their date and time from now.
-    explicit Preprocessor(ByteSink& errors, const RunOptions& options = {});
+    /// Problems go to the sink, or nowhere if it is empty. The predefined macros take their date
+    /// and time from now.
+    explicit Preprocessor(DiagnosticSink diagnostics, const RunOptions& options = {});
 
     /// Enters an object-like macro unless the name is defined.
     void defineMacro(std::string_view name, std::string_view text) {

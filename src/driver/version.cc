@@ -4,6 +4,8 @@
 #include <array>
 #include <cstdio>
 
+#include "umpre/version.h"
+
 namespace {
 
 using VersionText = std::array<char, 256>;

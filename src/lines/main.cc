@@ -25,7 +25,7 @@ using Task = umpre::LinesOptions::Task;
 
 // Hands all that can be read to the finder. Returns false if reading fails.
 bool readAll(int descriptor, umpre::MarkerFinder& finder, const umpre::OutputWriter& output) {
-    std::array<char, std::size_t{64} * 1024> block;  // NOLINT(*-member-init): is read into
+    std::array<char, std::size_t{64} * 1024> block{};
     while (!output.failed()) {
         const ssize_t count = ::read(descriptor, block.data(), block.size());
         if (count == 0) {

@@ -35,7 +35,7 @@ struct Outcome {
     const testing::Replaced replacedOutput(STDOUT_FILENO, out.writeEnd());
     testing::RecordingSink errors;
     OutputFile output;
-    Preprocessor preprocessor(errors);
+    Preprocessor preprocessor(linesTo(errors));
     Outcome outcome;
     outcome.runs = parseCommandLine(preprocessor, {output, errors}, static_cast<int>(words.size()),
                                     words.data());
@@ -132,7 +132,7 @@ TEST(CommandLine, WritesToAFile) {
     const testing::Replaced replacedInput(STDIN_FILENO, in.readEnd());
     testing::RecordingSink errors;
     OutputFile output;
-    Preprocessor preprocessor(errors);
+    Preprocessor preprocessor(linesTo(errors));
     ASSERT_TRUE(parseCommandLine(preprocessor, {output, errors}, 3, words.data()));
     EXPECT_EQ(preprocessor.run(), RunResult::Clean);
     EXPECT_TRUE(output.close());

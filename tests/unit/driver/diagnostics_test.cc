@@ -19,7 +19,7 @@ struct Fixture {
     OutputWriter output;
     testing::RecordingReporter reporter;
     ScannerStack sources{events, output, reporter, {}};
-    Diagnostics diagnostics{sink, sources};
+    Diagnostics diagnostics{linesTo(sink), sources};
 };
 
 TEST(Diagnostics, BeginsWithoutReports) {
@@ -96,7 +96,7 @@ TEST(Diagnostics, WritesEachMessageAtOnce) {
 TEST(Diagnostics, CountsWhatCouldNotBeWritten) {
     Fixture f;
     testing::RecordingSink failing(1);
-    Diagnostics diagnostics(failing, f.sources);
+    Diagnostics diagnostics(linesTo(failing), f.sources);
     diagnostics.reportError("a");
     EXPECT_TRUE(diagnostics.errorFlag());
     EXPECT_EQ(diagnostics.reportCount(), 1U);

@@ -23,7 +23,7 @@ struct Fixture {
 
     testing::RecordingSink output;
     testing::RecordingSink errors;
-    Preprocessor preprocessor{errors};
+    Preprocessor preprocessor{linesTo(errors)};
 };
 
 struct Row {

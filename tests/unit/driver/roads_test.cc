@@ -47,7 +47,7 @@ struct Outcome {
 };
 
 struct Run {
-    explicit Run(const RunOptions& options) : preprocessor(errors, options) {
+    explicit Run(const RunOptions& options) : preprocessor(linesTo(errors), options) {
         preprocessor.setOutput(output);
     }
 

@@ -1,0 +1,33 @@
+# SPDX-License-Identifier: MIT
+# What `cmake --install` puts where: the programs (component programs), and what is needed to build
+# with the library (component library).
+include(CMakePackageConfigHelpers)
+
+set(package_dir ${CMAKE_INSTALL_LIBDIR}/cmake/umpre)
+
+install(TARGETS umpre umpre-lines EXPORT umpreProgramTargets RUNTIME COMPONENT programs)
+install(FILES docs/umpre.1 docs/umpre-lines.1
+    DESTINATION ${CMAKE_INSTALL_MANDIR}/man1 COMPONENT programs)
+install(FILES README.md LICENSE TYPE DOC COMPONENT programs)
+
+configure_package_config_file(cmake/umpreConfig.cmake.in umpreConfig.cmake
+    INSTALL_DESTINATION ${package_dir})
+write_basic_package_version_file(umpreConfigVersion.cmake COMPATIBILITY SameMajorVersion)
+install(FILES ${PROJECT_BINARY_DIR}/umpreConfig.cmake ${PROJECT_BINARY_DIR}/umpreConfigVersion.cmake
+    DESTINATION ${package_dir} COMPONENT programs)
+install(EXPORT umpreProgramTargets NAMESPACE umpre:: DESTINATION ${package_dir} COMPONENT programs)
+
+install(TARGETS umpre_lib EXPORT umpreLibraryTargets
+    LIBRARY COMPONENT library
+    ARCHIVE COMPONENT library
+    FILE_SET HEADERS COMPONENT library)
+install(EXPORT umpreLibraryTargets NAMESPACE umpre:: DESTINATION ${package_dir} COMPONENT library)
+
+# Beside the folder that it is in, so that the installation can be moved.
+file(RELATIVE_PATH pc_to_prefix ${CMAKE_INSTALL_FULL_LIBDIR}/pkgconfig ${CMAKE_INSTALL_PREFIX})
+string(REGEX REPLACE "/$" "" pc_to_prefix ${pc_to_prefix})
+cmake_path(APPEND pc_libdir "\${prefix}" ${CMAKE_INSTALL_LIBDIR})
+cmake_path(APPEND pc_includedir "\${prefix}" ${CMAKE_INSTALL_INCLUDEDIR})
+configure_file(cmake/umpre.pc.in umpre.pc @ONLY)
+install(FILES ${PROJECT_BINARY_DIR}/umpre.pc
+    DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig COMPONENT library)

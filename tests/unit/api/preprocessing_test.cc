@@ -1,0 +1,248 @@
+// SPDX-License-Identifier: MIT
+#include "umpre/preprocessing.h"
+
+#include <new>
+#include <string>
+#include <string_view>
+#include <thread>
+#include <utility>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+#include "support/temporary_directory.h"
+#include "umpre/version.h"
+
+namespace umpre {
+namespace {
+
+// A diagnostic that outlives its call.
+struct Message {
+    Severity severity;
+    std::string file;
+    std::int32_t line;
+    std::string text;
+
+    bool operator==(const Message& other) const = default;
+};
+
+void PrintTo(const Message& message, std::ostream* stream) {
+    *stream << static_cast<int>(message.severity) << " " << message.file << ":" << message.line
+            << ": " << message.text;
+}
+
+struct Fixture {
+    Fixture() { connect(); }
+
+    void connect() {
+        preprocessing.setOutput([this](std::string_view bytes) {
+            output.append(bytes);
+            return true;
+        });
+        preprocessing.setDiagnostics([this](const Diagnostic& diagnostic) {
+            messages.push_back({diagnostic.severity, std::string(diagnostic.file), diagnostic.line,
+                                std::string(diagnostic.text)});
+        });
+    }
+
+    [[nodiscard]] Outcome run(std::string_view text) {
+        preprocessing.setSourceText("main", text);
+        return preprocessing.run();
+    }
+
+    Preprocessing preprocessing;
+    std::string output;
+    std::vector<Message> messages;
+};
+
+TEST(Preprocessing, ReadsAText) {
+    Fixture f;
+    EXPECT_EQ(f.run("text\n"), Outcome::Clean);
+    EXPECT_EQ(f.output, "#line 1 \"main\"\ntext\n");
+    EXPECT_TRUE(f.messages.empty());
+}
+
+TEST(Preprocessing, ReadsAFile) {
+    const testing::TemporaryDirectory folder;
+    const std::string name = folder.write("a.src", "text\n");
+    Fixture f;
+    f.preprocessing.setSourceFile(name);
+    EXPECT_EQ(f.preprocessing.run(), Outcome::Clean);
+    EXPECT_EQ(f.output, "#line 1 \"" + name + "\"\ntext\n");
+}
+
+TEST(Preprocessing, KeepsItsOwnCopyOfAText) {
+    Fixture f;
+    std::string text = "text\n";
+    f.preprocessing.setSourceText("main", text);
+    text.assign("other");
+    EXPECT_EQ(f.preprocessing.run(), Outcome::Clean);
+    EXPECT_EQ(f.output, "#line 1 \"main\"\ntext\n");
+}
+
+TEST(Preprocessing, HasAnEmptySourceAtFirst) {
+    const Fixture f;
+    EXPECT_EQ(f.preprocessing.run(), Outcome::Clean);
+    EXPECT_EQ(f.output, "#line 1 \"\"\n");
+}
+
+TEST(Preprocessing, NamesTheSourceInMarkersAndMessages) {
+    const testing::TemporaryDirectory folder;
+    Fixture f;
+    f.preprocessing.setMessageName("name");
+    EXPECT_EQ(f.run("#endif\n"), Outcome::Errors);
+    f.preprocessing.setSourceFile(folder.write("a.src", "text\n"));
+    EXPECT_EQ(f.preprocessing.run(), Outcome::Clean);
+    EXPECT_EQ(f.output, "#line 1 \"name\"\n\n#line 1 \"name\"\ntext\n");
+    EXPECT_EQ(f.messages.at(0).file, "name");
+}
+
+TEST(Preprocessing, DefinesMacrosOfWhichTheFirstHolds) {
+    Fixture f;
+    f.preprocessing.define("A");
+    f.preprocessing.define("B", "b");
+    f.preprocessing.define("B", "c");
+    EXPECT_EQ(f.run("A B\n"), Outcome::Clean);
+    EXPECT_EQ(f.output, "#line 1 \"main\"\n1 b\n");
+}
+
+TEST(Preprocessing, SearchesDirectoriesInTheirOrder) {
+    const testing::TemporaryDirectory folder;
+    folder.write("one/a.inc", "from one\n");
+    folder.write("two/a.inc", "from two\n");
+    Fixture f;
+    f.preprocessing.addIncludeDirectory(folder.nameOf("two"));
+    f.preprocessing.addIncludeDirectory(folder.nameOf("one"));
+    EXPECT_EQ(f.run("#include <a.inc>\n"), Outcome::Clean);
+    EXPECT_NE(f.output.find("from two"), std::string::npos);
+}
+
+TEST(Preprocessing, TellsProblemsApart) {
+    Fixture f;
+    EXPECT_EQ(f.run("#define A 1\n#define A 2\n#endif\ntext\n/*"), Outcome::Errors);
+    EXPECT_EQ(f.messages,
+              (std::vector<Message>{
+                  {Severity::Warning, "main", 3, "Macro \"A\" has an incompatible redefinition"},
+                  {Severity::Error, "main", 3, "No \"#if\" directive associated to \"#endif\""},
+                  {Severity::Note, "main", 5, "unterminated comment"}}));
+}
+
+TEST(Preprocessing, TellsThatTheSourceCannotBeOpened) {
+    Fixture f;
+    f.preprocessing.setSourceFile("/nowhere/a.src");
+    EXPECT_EQ(f.preprocessing.run(), Outcome::SourceNotOpened);
+    EXPECT_EQ(f.messages,
+              (std::vector<Message>{{Severity::Fatal, "", 0, "cannot open /nowhere/a.src"}}));
+    EXPECT_EQ(f.output, "");
+}
+
+TEST(Preprocessing, TellsThatTheInputCannotBeReadOn) {
+    Fixture f;
+    f.preprocessing.setSourceFile("/proc/self/mem");
+    EXPECT_EQ(f.preprocessing.run(), Outcome::InputFailed);
+    EXPECT_EQ(f.messages, (std::vector<Message>{{Severity::Failure, "/proc/self/mem", 1,
+                                                 "input in flex scanner failed"}}));
+}
+
+TEST(Preprocessing, TellsThatAConditionDividesByZero) {
+    Fixture f;
+    EXPECT_EQ(f.run("text\n#if 1 / 0\n"), Outcome::DivisionFault);
+    EXPECT_EQ(f.output, "#line 1 \"main\"\ntext\n");
+}
+
+TEST(Preprocessing, TellsThatTheOutputFailed) {
+    Fixture f;
+    f.preprocessing.setOutput([](std::string_view /*bytes*/) { return false; });
+    EXPECT_EQ(f.run("#endif\n"), Outcome::OutputFailed);
+}
+
+TEST(Preprocessing, TellsThatThereIsNoMemory) {
+    Fixture f;
+    f.preprocessing.setOutput([](std::string_view /*bytes*/) -> bool { throw std::bad_alloc(); });
+    EXPECT_EQ(f.run("text\n"), Outcome::InputFailed);
+    EXPECT_EQ(f.messages.back().severity, Severity::Failure);
+    EXPECT_EQ(f.messages.back().text, "out of dynamic memory in yy_create_buffer()");
+}
+
+TEST(Preprocessing, NeedsNoSinks) {
+    Preprocessing preprocessing;
+    preprocessing.setSourceText("main", "#endif\n");
+    EXPECT_EQ(preprocessing.run(), Outcome::Errors);
+}
+
+TEST(Preprocessing, RunsAgainFromTheBeginning) {
+    Fixture f;
+    EXPECT_EQ(f.run("#define A 1\n#if 1\n"), Outcome::Errors);
+    EXPECT_EQ(f.run("A\n"), Outcome::Clean);
+    EXPECT_EQ(f.output, "#line 1 \"main\"\n\n#line 1 \"main\"\nA\n");
+}
+
+TEST(Preprocessing, CanBeMoved) {
+    Preprocessing first;
+    first.define("A", "b");
+    first.setSourceText("main", "A\n");
+    Preprocessing second(std::move(first));
+    first = std::move(second);
+    std::string output;
+    first.setOutput([&output](std::string_view bytes) {
+        output.append(bytes);
+        return true;
+    });
+    EXPECT_EQ(first.run(), Outcome::Clean);
+    EXPECT_EQ(output, "#line 1 \"main\"\nb\n");
+}
+
+TEST(Preprocessing, HasTheVersionOfItsHeaders) {
+    EXPECT_STREQ(Preprocessing::version(), UMPRE_VERSION);
+}
+
+// What one thread makes of its own source.
+std::string resultOf(const std::string& name) {
+    Fixture f;
+    f.preprocessing.define("NAME", name);
+    std::string text = "#define TWICE(x) x x\n";
+    for (int count = 0; count < 2000; ++count) {
+        text.append("TWICE(NAME) \"")
+            .append(name)
+            .append("\" __LINE__ # /* x\n */\n#if NAME == 1\n#endif\n");
+    }
+    text.append("#endif\n");
+    EXPECT_EQ(f.run(text), Outcome::Errors);
+    return f.output + std::to_string(f.messages.size());
+}
+
+TEST(Preprocessing, RunsInTwoThreads) {
+    const std::string first = resultOf("1");
+    const std::string second = resultOf("two");
+    std::string firstAgain;
+    std::string secondAgain;
+    std::thread other([&secondAgain] { secondAgain = resultOf("two"); });
+    firstAgain = resultOf("1");
+    other.join();
+    EXPECT_EQ(firstAgain, first);
+    EXPECT_EQ(secondAgain, second);
+    EXPECT_NE(first, second);
+}
+
+struct Line {
+    Diagnostic diagnostic;
+    std::string_view expected;
+};
+
+TEST(MessageOf, IsTheLineThatTheProgramPrints) {
+    const std::vector<Line> table{
+        {{Severity::Error, "a", 2, "x"}, "a:2: x.\n"},
+        {{Severity::Error, "", 0, "x"}, ":0: x.\n"},
+        {{Severity::Warning, "a", -1, "x"}, "a:-1: Warning: x.\n"},
+        {{Severity::Fatal, "", 0, "x"}, "FATAL ERROR: x.\n"},
+        {{Severity::Fatal, "a", 3, "x"}, "a:3: FATAL ERROR: x.\n"},
+        {{Severity::Note, "a", 4, "x"}, "4: x.\n"},
+        {{Severity::Failure, "a", 5, "x"}, "x\n"},
+    };
+    for (const Line& line : table) {
+        EXPECT_EQ(messageOf(line.diagnostic), line.expected);
+    }
+}
+
+}  // namespace
+}  // namespace umpre
