@@ -182,16 +182,39 @@ Outcome Conditionals::beginBranch(DirectiveLine& line) {
 
 // Returns whether the line's branch is taken, or nothing if that cannot be told.
 std::optional<bool> Conditionals::condition(DirectiveLine& line) {
-    if (line.word() != KW_IFDEF && line.word() != KW_IFNDEF) {
-        return std::nullopt;
+    switch (line.word()) {
+    case KW_IFDEF: return isDefined(line);
+    case KW_IFNDEF: {
+        const std::optional<bool> known = isDefined(line);
+        return known ? std::optional(!*known) : std::nullopt;
     }
+    default: return isTrue(line);
+    }
+}
+
+std::optional<bool> Conditionals::isDefined(DirectiveLine& line) {
     line.skipBlanks();
     const Token name = line.next();
     line.skipBlanks();
     if (!isName(name.kind) || !line.isAtEnd()) {
         return std::nullopt;
     }
-    return (macros_.find(name.text) != nullptr) == (line.word() == KW_IFDEF);
+    return macros_.find(name.text) != nullptr;
+}
+
+std::optional<bool> Conditionals::isTrue(DirectiveLine& line) {
+    byteTokens_.read(line);
+    bool ok = true;
+    ExprValue value;
+    try {
+        value = byteEvaluator_.evaluate(ok);
+    } catch (const ArithmeticFault&) {
+        return std::nullopt;  // the token road may have something to report before it comes to this
+    }
+    if (byteTokens_.peek() != END_OF_INPUT || !byteTokens_.isTold()) {
+        return std::nullopt;
+    }
+    return value.value != 0;
 }
 
 }  // namespace umpre

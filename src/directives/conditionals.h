@@ -27,7 +27,9 @@ public:
           expander_(expander),
           lexer_(lexer),
           reporter_(reporter),
-          evaluator_(sources, macros, reporter) {}
+          evaluator_(sources, macros, reporter),
+          byteTokens_(macros),
+          byteEvaluator_(byteTokens_, macros, byteTokens_) {}
 
     /// Tells whether lines are being skipped.
     [[nodiscard]] bool skipping() const noexcept { return groups_.skipping(); }
@@ -60,13 +62,17 @@ private:
     [[nodiscard]] DirectiveLine::Outcome beginGroup(DirectiveLine& line);
     [[nodiscard]] DirectiveLine::Outcome beginBranch(DirectiveLine& line);
     [[nodiscard]] std::optional<bool> condition(DirectiveLine& line);
+    [[nodiscard]] std::optional<bool> isDefined(DirectiveLine& line);
+    [[nodiscard]] std::optional<bool> isTrue(DirectiveLine& line);
 
     ScannerStack& sources_;
     MacroTable& macros_;
     MacroExpander& expander_;
     TextLexer& lexer_;
     Reporter& reporter_;
-    Evaluator evaluator_;
+    Evaluator<ScannerStack> evaluator_;
+    ConditionTokens byteTokens_;
+    Evaluator<ConditionTokens> byteEvaluator_;
     ConditionalStack groups_;
 };
 

@@ -16,7 +16,8 @@ namespace umpre {
 
 using enum TokenKind;
 
-ExprValue Evaluator::evaluate(bool& ok) {
+template <typename Tokens>
+ExprValue Evaluator<Tokens>::evaluate(bool& ok) {
     pending_.clear();
     ok_ = true;
     ExprValue value = operand();
@@ -28,10 +29,11 @@ ExprValue Evaluator::evaluate(bool& ok) {
 }
 
 // Reads an operand, with the unary operators and the opening brackets before it.
-ExprValue Evaluator::operand() {
+template <typename Tokens>
+ExprValue Evaluator<Tokens>::operand() {
     for (;;) {
-        sources_.skipBlanks();
-        const TokenKind kind = sources_.peek();
+        tokens_.skipBlanks();
+        const TokenKind kind = tokens_.peek();
         switch (kind) {
         case BANG:
         case TILDE:
@@ -42,12 +44,13 @@ ExprValue Evaluator::operand() {
             break;
         default: return primary(kind);
         }
-        sources_.next();
+        tokens_.next();
     }
 }
 
-ExprValue Evaluator::primary(TokenKind kind) {
-    const Token token = sources_.next();
+template <typename Tokens>
+ExprValue Evaluator<Tokens>::primary(TokenKind kind) {
+    const Token token = tokens_.next();
     if (kind == KW_DEFINED) {
         return definedOperator();
     }
@@ -64,51 +67,54 @@ ExprValue Evaluator::primary(TokenKind kind) {
     return syntaxError("Lexical element expected");
 }
 
-ExprValue Evaluator::definedOperator() {
-    sources_.skipBlanks();
-    const bool parenthesized = sources_.peek() == LEFT_PARENTHESIS;
+template <typename Tokens>
+ExprValue Evaluator<Tokens>::definedOperator() {
+    tokens_.skipBlanks();
+    const bool parenthesized = tokens_.peek() == LEFT_PARENTHESIS;
     if (parenthesized) {
-        sources_.next();
-        sources_.skipBlanks();
+        tokens_.next();
+        tokens_.skipBlanks();
     }
-    const Token name = sources_.next();
+    const Token name = tokens_.next();
     if (name.kind != IDENTIFIER) {
         return syntaxError("Identifier expected for 'defined' operator");
     }
     const bool isDefined = macros_.find(name.text) != nullptr;
     if (parenthesized) {
-        sources_.skipBlanks();
-        if (sources_.next().kind != RIGHT_PARENTHESIS) {
+        tokens_.skipBlanks();
+        if (tokens_.next().kind != RIGHT_PARENTHESIS) {
             return syntaxError(R"text(")" expected for "defined" operator)text");
         }
     }
     return {isDefined ? 1U : 0U, true};
 }
 
-void Evaluator::rejectCall() {
-    sources_.skipBlanks();
-    if (sources_.peek() == LEFT_PARENTHESIS) {
+template <typename Tokens>
+void Evaluator<Tokens>::rejectCall() {
+    tokens_.skipBlanks();
+    if (tokens_.peek() == LEFT_PARENTHESIS) {
         syntaxError("A function call is not allowed in a constant expression");
     }
 }
 
 // Takes a complete operand as far as it goes. Returns true when it is the value of the whole
 // expression, false when another operand must be read first.
-bool Evaluator::isComplete(ExprValue& value) {
+template <typename Tokens>
+bool Evaluator<Tokens>::isComplete(ExprValue& value) {
     do {
         applyTightest(value);
-        sources_.skipBlanks();
-        const TokenKind kind = sources_.peek();
+        tokens_.skipBlanks();
+        const TokenKind kind = tokens_.peek();
         const int precedence = precedenceOf(kind);
         if (precedence > 0) {
             applyBinaries(precedence, value);
-            sources_.next();
+            tokens_.next();
             pending_.push_back({Pending::Kind::Binary, kind, value, {}});
             return false;
         }
         applyBinaries(1, value);
         if (kind == QUESTION) {
-            sources_.next();
+            tokens_.next();
             pending_.push_back({Pending::Kind::Middle, kind, value, {}});
             return false;
         }
@@ -118,12 +124,13 @@ bool Evaluator::isComplete(ExprValue& value) {
 
 // Takes a value that no operator goes on with. Returns true when it closed a parenthesis, whose
 // value is an operand again; otherwise an operand must be read, or nothing is pending.
-bool Evaluator::closesBracket(ExprValue& value) {
+template <typename Tokens>
+bool Evaluator<Tokens>::closesBracket(ExprValue& value) {
     while (!pending_.empty()) {
         Pending& bracket = pending_.back();
         if (bracket.kind == Pending::Kind::Middle) {
-            sources_.skipBlanks();
-            if (sources_.next().kind == COLON) {
+            tokens_.skipBlanks();
+            if (tokens_.next().kind == COLON) {
                 bracket.kind = Pending::Kind::Third;
                 bracket.middle = value;
                 return false;
@@ -133,8 +140,8 @@ bool Evaluator::closesBracket(ExprValue& value) {
             value = bracket.value.value != 0 ? bracket.middle : value;
         } else {
             pending_.pop_back();
-            sources_.skipBlanks();
-            if (sources_.next().kind == RIGHT_PARENTHESIS) {
+            tokens_.skipBlanks();
+            if (tokens_.next().kind == RIGHT_PARENTHESIS) {
                 rejectCall();
             } else {
                 value = syntaxError(R"text(")" expected)text");
@@ -148,7 +155,8 @@ bool Evaluator::closesBracket(ExprValue& value) {
 
 // Applies what no operator behind the value can come before. A division fault happens here, before
 // anything more is read.
-void Evaluator::applyTightest(ExprValue& value) {
+template <typename Tokens>
+void Evaluator<Tokens>::applyTightest(ExprValue& value) {
     while (!pending_.empty() && pending_.back().kind == Pending::Kind::Unary) {
         value = applyUnary(pending_.back().operation, value);
         pending_.pop_back();
@@ -157,7 +165,8 @@ void Evaluator::applyTightest(ExprValue& value) {
 }
 
 // Applies the binary operators before the value that bind at least that tightly.
-void Evaluator::applyBinaries(int precedence, ExprValue& value) {
+template <typename Tokens>
+void Evaluator<Tokens>::applyBinaries(int precedence, ExprValue& value) {
     while (!pending_.empty() && pending_.back().kind == Pending::Kind::Binary
            && precedenceOf(pending_.back().operation) >= precedence) {
         value = applyBinary(pending_.back().operation, pending_.back().value, value);
@@ -165,10 +174,14 @@ void Evaluator::applyBinaries(int precedence, ExprValue& value) {
     }
 }
 
-ExprValue Evaluator::syntaxError(std::string_view message) {
+template <typename Tokens>
+ExprValue Evaluator<Tokens>::syntaxError(std::string_view message) {
     reporter_.reportError(message);
     ok_ = false;
     return {};
 }
+
+template class Evaluator<ScannerStack>;
+template class Evaluator<ConditionTokens>;
 
 }  // namespace umpre

@@ -5,6 +5,7 @@
 #include <string_view>
 #include <vector>
 
+#include "expr/condition_tokens.h"
 #include "expr/expr_value.h"
 #include "lex/reporter.h"
 #include "lex/scanner_stack.h"
@@ -12,11 +13,12 @@
 
 namespace umpre {
 
-/// Evaluates the condition that is the current source, while it reads it.
+/// Evaluates a condition while it reads its tokens, from a ScannerStack or ConditionTokens.
+template <typename Tokens>
 class Evaluator {
 public:
-    Evaluator(ScannerStack& sources, MacroTable& macros, Reporter& reporter) noexcept
-        : sources_(sources), macros_(macros), reporter_(reporter) {}
+    Evaluator(Tokens& tokens, MacroTable& macros, Reporter& reporter) noexcept
+        : tokens_(tokens), macros_(macros), reporter_(reporter) {}
 
     /// Reads one expression, up to the first token that cannot go on with it, and returns its
     /// value. Sets `ok` to false after a syntax error, which is reported; reading goes on all the
@@ -43,12 +45,15 @@ private:
     void applyBinaries(int precedence, ExprValue& value);
     ExprValue syntaxError(std::string_view message);
 
-    ScannerStack& sources_;
+    Tokens& tokens_;
     MacroTable& macros_;
     Reporter& reporter_;
     std::vector<Pending> pending_;
     bool ok_ = true;  // no syntax error yet
 };
+
+extern template class Evaluator<ScannerStack>;
+extern template class Evaluator<ConditionTokens>;
 
 }  // namespace umpre
 

@@ -40,7 +40,12 @@ public:
 
     /// Passes over blanks, comments and continuations. A comment or a continuation that does not
     /// end in this line, or in memory, is not passed; it comes next as a token of the kind OTHER.
-    void skipBlanks() { at_ = blanksEnd(at_).end; }
+    /// Tells whether there were any.
+    bool skipBlanks() {
+        const char* const begin = at_;
+        at_ = blanksEnd(at_).end;
+        return at_ != begin;
+    }
 
     /// Tells whether no continuation was passed so far: the file's line is that of the bytes read.
     [[nodiscard]] bool isOneLine() const noexcept { return lines_ == 0; }

@@ -28,6 +28,7 @@ struct MacroText {
 /// worked out at its first use.
 class Macro {
 public:
+    /// A zero byte follows it.
     [[nodiscard]] std::string_view text() const noexcept {
         return {bytes_ + parametersSize_, textSize_};
     }
@@ -46,7 +47,7 @@ public:
 private:
     friend class MacroTable;
 
-    // The parameters, and behind them the text.
+    // The parameters, behind them the text and a zero byte.
     char* bytes_ = nullptr;
     std::size_t capacity_ = 0;
     std::size_t textSize_ = 0;

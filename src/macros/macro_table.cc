@@ -62,7 +62,7 @@ MacroTable::Definition MacroTable::define(std::string_view name, const MacroText
 
 void MacroTable::replace(MacroName& name, const MacroText& definition) {
     Macro& macro = name.macro;
-    const std::size_t size = definition.parameters.size() + definition.text.size();
+    const std::size_t size = definition.parameters.size() + definition.text.size() + 1;
     if (size > macro.capacity_) {
         macro.capacity_ = std::max(size, 2 * macro.capacity_);
         macro.bytes_ = newBytes(macro.capacity_);
@@ -70,6 +70,7 @@ void MacroTable::replace(MacroName& name, const MacroText& definition) {
     macro.parametersSize_ = definition.parameters.copy(macro.bytes_, definition.parameters.size());
     macro.textSize_ =
         definition.text.copy(macro.bytes_ + macro.parametersSize_, definition.text.size());
+    macro.bytes_[size - 1] = '\0';
     const auto commas = std::count(definition.parameters.begin(), definition.parameters.end(), ',');
     macro.parameterCount_ =
         definition.parameters.empty() ? 0 : static_cast<std::uint32_t>(commas) + 1;

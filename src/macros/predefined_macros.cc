@@ -4,9 +4,13 @@
 #include <array>
 #include <ctime>
 #include <string>
+#include <string_view>
 
 namespace umpre {
 namespace {
+
+constexpr std::string_view kFile = "__FILE__";
+constexpr std::string_view kLine = "__LINE__";
 
 [[nodiscard]] std::string twoDigits(int number, char filling) {
     std::string text = std::to_string(number);
@@ -21,8 +25,8 @@ namespace {
 void definePredefinedMacros(MacroTable& macros) {
     static constexpr std::array<const char*, 12> kMonths{"Jan", "Feb", "Mar", "Apr", "May", "Jun",
                                                          "Jul", "Aug", "Sep", "Oct", "Nov", "Dec"};
-    macros.defineMacro("__FILE__", "");
-    macros.defineMacro("__LINE__", "");
+    macros.defineMacro(kFile, "");
+    macros.defineMacro(kLine, "");
     const std::time_t now = std::time(nullptr);
     std::tm local{};
     ::localtime_r(&now, &local);
@@ -35,11 +39,15 @@ void definePredefinedMacros(MacroTable& macros) {
     macros.defineMacro("__TIME__", time);
 }
 
+bool isRefreshed(const MacroName& name) noexcept {
+    return mayBeRefreshed(name) && (name.text == kFile || name.text == kLine);
+}
+
 void refreshPredefined(MacroTable& macros, MacroName& name, const SourcePosition& position) {
     std::string text;
-    if (name.text == "__FILE__") {
+    if (name.text == kFile) {
         text.append("\"").append(position.fileName).append("\"");
-    } else if (name.text == "__LINE__") {
+    } else if (name.text == kLine) {
         text = std::to_string(position.line);
     } else {
         return;

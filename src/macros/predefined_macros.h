@@ -20,6 +20,9 @@ void definePredefinedMacros(MacroTable& macros);
     return name.text.size() == kLength;
 }
 
+/// Tells whether `refreshPredefined` gives this macro a text.
+[[nodiscard]] bool isRefreshed(const MacroName& name) noexcept;
+
 /// Gives `__FILE__` and `__LINE__` their current text; leaves every other macro of the table alone.
 void refreshPredefined(MacroTable& macros, MacroName& name, const SourcePosition& position);
 

@@ -396,6 +396,118 @@ TEST(Roads, AgreeOnConditions) {
     });
 }
 
+TEST(Roads, AgreeOnExpandedConditions) {
+    const std::string definitions =
+        "#define A B\n#define B A\n#define LESS <\n#define NOT !\n#define AND &\n#define HAS "
+        "defined\n"
+        "#define SUM (N + 1)\n#define MINUS -1\n#define SLASH /\n#define STAR *\n#define HEX 0x1\n"
+        "#define SELF SELF + N\n#define L LL\n#define LL N\n#define OPEN (\n#define CALL F\n"
+        "#define QUOTE '\n#define TEXT \"a\"\n#define JOINED /\\\n* a\n";
+    const std::vector<std::string> conditions = {"SUM == 4",
+                                                 "N==3&&NOT M",
+                                                 "1N",
+                                                 "N1 + N 1",
+                                                 "1 LESS 2",
+                                                 "1<LESS 1 == 2",
+                                                 "1 LESS< 1 == 2",
+                                                 "1 <EMPTY< 1 == 2",
+                                                 "NOT=1",
+                                                 "1 NOT EMPTY= 2",
+                                                 "1 NOT= 2",
+                                                 "1 AND AND 1",
+                                                 "1 ANDAND 1",
+                                                 "1 AND& 1",
+                                                 "HAS N",
+                                                 "HAS(N)",
+                                                 "HAS EMPTY N",
+                                                 "HAS HAS",
+                                                 "HAS EMPTY",
+                                                 "defined EMPTY N",
+                                                 "defined(EMPTY",
+                                                 "defined EMPTY(N)",
+                                                 "-MINUS",
+                                                 "--MINUS == MINUS",
+                                                 "1 SLASH 1",
+                                                 "1 SLASH/ 0",
+                                                 "1 SLASH* 0",
+                                                 "1 /STAR 0",
+                                                 "HEX f",
+                                                 "HEXf",
+                                                 "HEX==1",
+                                                 "SELF == 3",
+                                                 "A",
+                                                 "A + B == 0",
+                                                 "L == 3",
+                                                 "L(",
+                                                 "M(1)",
+                                                 "F(1)",
+                                                 "F (1)",
+                                                 "CALL(1)",
+                                                 "CALL (N)",
+                                                 "CALL",
+                                                 "F",
+                                                 "OPEN N)",
+                                                 "OPEN 1",
+                                                 "N OPEN 1)",
+                                                 "EMPTY",
+                                                 "EMPTY 1 EMPTY",
+                                                 "(EMPTY 1 EMPTY)",
+                                                 "QUOTE a'",
+                                                 "'a' == 97 && N",
+                                                 "TEXT",
+                                                 "JOINED */ 1",
+                                                 "__LINE__ > 20",
+                                                 "__FILE__",
+                                                 "__LINE__ == N",
+                                                 "defined __LINE__",
+                                                 "1 /* a */ + /* b */ 1 // c",
+                                                 "1 \\\n + N \\\n",
+                                                 "1 \\\n\\\n2",
+                                                 "1 / 0",
+                                                 "1 / 0 + F(",
+                                                 "F(1 / 0",
+                                                 "1 / EMPTY 0",
+                                                 "N % (N - 3)",
+                                                 "0 && 1 / 0",
+                                                 "1 ? 1 : 1 / 0",
+                                                 "N > 2 ? N < 3 ? 0 : 1 : 0",
+                                                 "(((((N)))))",
+                                                 "!!!!N",
+                                                 "-N < 0u",
+                                                 "N >> 1 << 1 == 2",
+                                                 "07 == 7 && 08",
+                                                 "0x",
+                                                 "1e5",
+                                                 "1.0",
+                                                 "1 = 1",
+                                                 "1, 1",
+                                                 "if",
+                                                 "defined if",
+                                                 "if(1)",
+                                                 "1 1",
+                                                 "1 )",
+                                                 "( 1",
+                                                 "1 ?",
+                                                 "1 ? 2",
+                                                 "#",
+                                                 "@",
+                                                 "$",
+                                                 "\\",
+                                                 "\xE9",
+                                                 "1 \r",
+                                                 "1 /* a\n */ + 1",
+                                                 "1 // a\r",
+                                                 "1\t+\v1\f",
+                                                 ""};
+    for (const std::string& condition : conditions) {
+        const std::string text =
+            "#if " + condition + "\nif\n#elif N\nelif\n#else\nelse\n#endif\n"
+            "#if !N\nif\n#elif " + condition + "\nelif\n#else\nelse\n#endif\nN\n";
+        expectSameOnAllRoads(std::string(kMacros) + definitions + text);
+        expectSameOnAllRoads(text);
+    }
+}
+
 TEST(Roads, AgreeOnLongLines) {
     const std::string words = [] {
         std::string text;

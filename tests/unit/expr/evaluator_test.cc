@@ -39,7 +39,7 @@ struct Condition : SourceFixture {
     }
 
     MacroTable macros;
-    Evaluator evaluator{sources, macros, reporter};
+    Evaluator<ScannerStack> evaluator{sources, macros, reporter};
     bool ok = true;
     ExprValue value;
     std::string left;  // of the text

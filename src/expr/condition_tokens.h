@@ -1,0 +1,84 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_EXPR_CONDITION_TOKENS_H
+#define UMPRE_EXPR_CONDITION_TOKENS_H
+
+#include <cstddef>
+#include <cstdint>
+#include <string_view>
+#include <vector>
+
+#include "lex/directive_line.h"
+#include "lex/reporter.h"
+#include "lex/token.h"
+#include "macros/macro_table.h"
+
+namespace umpre {
+
+/// The tokens of a condition, macros expanded and blanks left out, straight from the bytes of its
+/// line. It is a reporter, too: what would have to be reported is for the scanner to find.
+class ConditionTokens final : public Reporter {
+public:
+    explicit ConditionTokens(MacroTable& macros) noexcept : macros_(macros) {}
+
+    /// Begins to read a line where its reading stands. The line is borrowed.
+    void read(DirectiveLine& line);
+
+    /// Returns false once something was met that cannot be told from the bytes. The condition seems
+    /// to end there.
+    [[nodiscard]] bool isTold() const noexcept { return isTold_; }
+
+    [[nodiscard]] TokenKind peek() {
+        if (!hasPeek_) {
+            peeked_ = scan();
+            hasPeek_ = true;
+        }
+        return peeked_.kind;
+    }
+
+    Token next() {
+        (void)peek();
+        hasPeek_ = false;
+        return peeked_;
+    }
+
+    /// There are none.
+    void skipBlanks() {}
+
+    void reportError(std::string_view /*message*/) override { isTold_ = false; }
+
+    void reportWarning(std::string_view /*message*/) override { isTold_ = false; }
+
+    void noteUnterminatedComment(std::int32_t /*line*/) override { isTold_ = false; }
+
+    [[nodiscard]] std::size_t reportCount() const override { return isTold_ ? 0 : 1; }
+
+private:
+    // A macro's text that is read in the place of its name.
+    struct Replacement {
+        const MacroName* macro;
+        const char* at;
+        const char* end;
+    };
+
+    // What the tokens behind `defined` are.
+    enum class Expected { Anything, Operand, ParenthesizedOperand };
+
+    [[nodiscard]] Token scan();
+    [[nodiscard]] Token scanUnexpanded();
+    [[nodiscard]] bool isProtected(TokenKind kind);
+    [[nodiscard]] bool beginReplacement(std::string_view name);
+
+    MacroTable& macros_;
+    DirectiveLine* line_ = nullptr;
+    std::vector<Replacement> replacements_;  // the innermost one is the last
+    Token last_;                             // the token before the one that comes next, or a blank
+    bool meets_ = false;                     // a replacement began or ended since
+    Expected expected_ = Expected::Anything;
+    Token peeked_;
+    bool hasPeek_ = false;
+    bool isTold_ = true;
+};
+
+}  // namespace umpre
+
+#endif
