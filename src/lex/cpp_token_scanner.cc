@@ -81,14 +81,10 @@ std::size_t CppTokenScanner::takePlain(const NameFilter& macroNames, TokenKind s
     }
     index_ = first + 1;
     findRun();
-    std::size_t at = first;
     const std::size_t last = std::min(end_, runEnd_);
-    while (at < last) {
-        const TokenKind kind = text.kind(at);
-        if (kind == stop || (isName(kind) && mayBeMacro(text, at, macroNames))) {
-            break;
-        }
-        ++at;
+    std::size_t at = text.nextNotable(first, last);
+    while (at < last && text.kind(at) != stop && !mayBeMacro(text, at, macroNames)) {
+        at = text.nextNotable(at + 1, last);
     }
     index_ = at;
     restart();

@@ -71,9 +71,12 @@ private:
     bool peekedEnd_ = false;
 };
 
-/// Tells whether a name in a text may be a macro.
+/// Tells whether a token of a text is a name that may be a macro.
 [[nodiscard]] inline bool mayBeMacro(const LexedText& text, std::size_t index,
                                      const NameFilter& macroNames) {
+    if (!isName(text.kind(index))) {
+        return false;
+    }
     const Name* const name = text.name(index);
     return name != nullptr ? name->isDefined : macroNames.mayHold(text.text(index));
 }

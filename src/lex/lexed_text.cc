@@ -2,9 +2,41 @@
 #include "lex/lexed_text.h"
 
 #include <algorithm>
+#include <array>
 #include <cassert>
+#include <cstring>
+
+#include "lex/token_join.h"
 
 namespace umpre {
+namespace {
+
+// Bytes of one group may go on with each other in a token; a token that begins with a byte of the
+// last group must be looked at by itself.
+constexpr std::uint8_t kWord = 1;
+constexpr std::uint8_t kPunctuator = 2;
+constexpr std::uint8_t kBlank = 4;
+constexpr std::uint8_t kAlone = 8;
+
+constexpr std::array<std::uint8_t, 256> kGroups = [] {
+    std::array<std::uint8_t, 256> groups{};
+    const auto add = [&groups](std::string_view bytes, std::uint8_t group) {
+        for (const char byte : bytes) {
+            groups[static_cast<unsigned char>(byte)] |= group;
+        }
+    };
+    add("ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz_0123456789", kWord);
+    add("/*<>=&|#!", kPunctuator);
+    add(" \t\v\f\n\r", kBlank);
+    add("\t\v\f\n\r\\\"'", kAlone);
+    return groups;
+}();
+
+[[nodiscard]] std::uint8_t groupsOf(char byte) noexcept {
+    return kGroups[static_cast<unsigned char>(byte)];
+}
+
+}  // namespace
 
 void LexedText::clear() {
     text_.clear();
@@ -13,21 +45,50 @@ void LexedText::clear() {
     outline_.reset();
 }
 
+void LexedText::append(TokenKind kind, std::string_view text, Name* name) {
+    std::memcpy(text_.extend(text.size()), text.data(), text.size());
+    Entry entry(kind, text_.size(), name);
+    entry.set(Entry::kNotable,
+              isName(kind) || kind == TokenKind::NEWLINE || kind == TokenKind::KW_DEFINED);
+    *tokens_.extend(1) = entry;
+    markUnclean(tokens_.size() - 1);
+}
+
 void LexedText::append(const LexedText& other, std::size_t first, std::size_t last) {
     assert(!other.hasEffects());
     if (first == last) {
         return;
     }
     const std::size_t shift = text_.size() - other.beginOf(first);  // may wrap
-    text_.append(other.joined(first, last));
-    const std::size_t before = tokens_.size();
-    const auto from = [&other](std::size_t index) {
-        return other.tokens_.begin() + static_cast<std::ptrdiff_t>(index);
-    };
-    tokens_.insert(tokens_.end(), from(first), from(last));
-    for (std::size_t index = before; index < tokens_.size(); ++index) {
-        tokens_[index].shift(shift);
+    const std::string_view text = other.joined(first, last);
+    std::memcpy(text_.extend(text.size()), text.data(), text.size());
+    const std::size_t meeting = tokens_.size();
+    Entry* const added = tokens_.extend(last - first);
+    const Entry* const from = other.tokens_.data() + first;
+    for (std::size_t index = 0; index < last - first; ++index) {
+        added[index] = from[index].shifted(shift);
     }
+    markUnclean(meeting);
+}
+
+// Most tokens are known to be clean by the bytes on the two sides of where they begin.
+void LexedText::markUnclean(std::size_t index) {
+    const std::size_t begin = beginOf(index);
+    const std::uint8_t before = begin == 0 ? 0 : groupsOf(text_[begin - 1]);
+    const std::uint8_t after = begin == text_.size() ? kAlone : groupsOf(text_[begin]);
+    if ((before & after) != 0 || (after & kAlone) != 0) {
+        tokens_[index].set(Entry::kUnclean, isFoundUnclean(index));
+    } else {
+        tokens_[index].set(Entry::kUnclean, false);
+    }
+}
+
+bool LexedText::isFoundUnclean(std::size_t index) const {
+    const Token token = this->token(index);
+    if (isBlankOrNewline(token.kind)) {
+        return token.text != " " || (index > 0 && isBlankOrNewline(kind(index - 1)));
+    }
+    return isLoneQuote(token) || (index > 0 && mayJoin(this->token(index - 1), token));
 }
 
 void LexedText::addCommentEffect(std::size_t lineEnds, bool unterminated, std::int32_t line) {

@@ -5,11 +5,11 @@
 #include <cstddef>
 #include <cstdint>
 #include <memory>
-#include <string>
 #include <string_view>
 #include <vector>
 
 #include "lex/comment_sink.h"
+#include "lex/growing_array.h"
 #include "lex/no_expand_set.h"
 #include "lex/token.h"
 
@@ -25,10 +25,7 @@ public:
     void clear();
 
     /// Adds a token of a known kind. `name` is the entry of a name, if it is known.
-    void append(TokenKind kind, std::string_view text, Name* name = nullptr) {
-        text_.append(text);
-        tokens_.emplace_back(kind, text_.size(), name);
-    }
+    void append(TokenKind kind, std::string_view text, Name* name = nullptr);
 
     /// Adds tokens `first` up to, not including, `last` of another text, which has no effects.
     void append(const LexedText& other, std::size_t first, std::size_t last);
@@ -53,8 +50,23 @@ public:
         return {kind(index), text(index), name(index)};
     }
 
+    /// Tells that a token stays itself if its text and those before it are joined and lexed again,
+    /// and, if it is a blank, that it is one space between two other tokens.
+    [[nodiscard]] bool isClean(std::size_t index) const noexcept {
+        return !tokens_[index].has(Entry::kUnclean);
+    }
+
+    /// Returns the first token from `first` on, and before `last`, that a reader may have to do
+    /// something about: a name, a line end, `defined`. If there is none, returns `last`.
+    [[nodiscard]] std::size_t nextNotable(std::size_t first, std::size_t last) const noexcept {
+        while (first < last && !tokens_[first].has(Entry::kNotable)) {
+            ++first;
+        }
+        return first;
+    }
+
     /// Returns the texts of all tokens, joined.
-    [[nodiscard]] const std::string& joined() const noexcept { return text_; }
+    [[nodiscard]] std::string_view joined() const noexcept { return {text_.data(), text_.size()}; }
 
     /// Returns the texts of tokens `first` up to, not including, `last`, joined.
     [[nodiscard]] std::string_view joined(std::size_t first, std::size_t last) const noexcept {
@@ -71,28 +83,44 @@ public:
     void carryOutEffects(std::size_t index, CommentSink& sink) const;
 
 private:
-    // A kind, and where the token's text ends in `text_`; it begins where the last one ends. One
-    // word holds both: long bodies and arguments are mostly these.
+    // A kind, what readers want to know quickly, and where the token's text ends in `text_`; it
+    // begins where the last one ends. One word holds all: long bodies and arguments are mostly
+    // these.
     class Entry {
     public:
+        static constexpr std::uint64_t kNotable = 1U << 10U;
+        static constexpr std::uint64_t kUnclean = 1U << 11U;
+
+        Entry() = default;
+
         Entry(TokenKind kind, std::size_t end, Name* name) noexcept
-            : bits_(end << kKindBits | static_cast<std::uint64_t>(kind)), name_(name) {}
+            : bits_(end << kLowBits | static_cast<std::uint64_t>(kind)), name_(name) {}
 
         [[nodiscard]] TokenKind kind() const noexcept {
-            return static_cast<TokenKind>(bits_ & ((1U << kKindBits) - 1));
+            return static_cast<TokenKind>(bits_ & (kNotable - 1));
         }
 
-        [[nodiscard]] std::size_t end() const noexcept { return bits_ >> kKindBits; }
+        [[nodiscard]] bool has(std::uint64_t mark) const noexcept { return (bits_ & mark) != 0; }
 
-        /// Moves the end; a shift that is negative wraps.
-        void shift(std::size_t by) noexcept { bits_ += by << kKindBits; }
+        void set(std::uint64_t mark, bool isSet) noexcept {
+            bits_ = (bits_ & ~mark) | (isSet ? mark : 0);
+        }
+
+        [[nodiscard]] std::size_t end() const noexcept { return bits_ >> kLowBits; }
+
+        /// Returns the token with its end moved; a shift that is negative wraps.
+        [[nodiscard]] Entry shifted(std::size_t by) const noexcept {
+            Entry result = *this;
+            result.bits_ += by << kLowBits;
+            return result;
+        }
 
         [[nodiscard]] Name* name() const noexcept { return name_; }
 
         void setName(Name* name) noexcept { name_ = name; }
 
     private:
-        static constexpr unsigned kKindBits = 16;
+        static constexpr unsigned kLowBits = 16;
         std::uint64_t bits_;
         Name* name_;
     };
@@ -108,8 +136,11 @@ private:
         return index == 0 ? 0 : tokens_[index - 1].end();
     }
 
-    std::string text_;
-    std::vector<Entry> tokens_;
+    void markUnclean(std::size_t index);
+    [[nodiscard]] bool isFoundUnclean(std::size_t index) const;
+
+    GrowingArray<char> text_;
+    GrowingArray<Entry> tokens_;
     std::vector<Effect> effects_;  // in the order of the tokens
     mutable std::shared_ptr<const TextOutline> outline_;
 };

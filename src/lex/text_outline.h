@@ -11,8 +11,7 @@ namespace umpre {
 
 /// What is known of a text as a whole.
 struct TextOutline {
-    /// Any part of the text, joined and lexed again, gives the same tokens: no blanks but single
-    /// spaces, no lone quotes, no tokens that meet and may join.
+    /// All its tokens are clean: any part of it, joined and lexed again, gives the same tokens.
     bool isPlain = false;
     /// Of each "(" the place of its ")"; of those without one, and of other tokens, 0.
     std::vector<std::size_t> closing;

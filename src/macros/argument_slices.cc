@@ -7,7 +7,6 @@
 #include "macros/argument_slices.h"
 
 #include "lex/text_outline.h"
-#include "lex/token_join.h"
 
 namespace umpre {
 namespace {
@@ -15,7 +14,7 @@ namespace {
 using enum TokenKind;
 
 // Up to so many tokens are looked at before the outline is asked for.
-constexpr std::size_t kShort = 64;
+constexpr std::size_t kShort = 512;
 
 class Slicer {
 public:
@@ -90,15 +89,11 @@ private:
 
     // Looks at one token of an argument. Returns false if it is a blank that must be changed.
     [[nodiscard]] bool look(Argument& argument) const {
-        const Token token = text_.token(at_);
-        if (isBlankOrNewline(token.kind)) {
-            return token.text == " " && text_.kind(at_ - 1) != WHITESPACE;
+        if (text_.isClean(at_)) {
+            return true;
         }
-        const bool meets = argument.raw.last == at_ && at_ > argument.raw.first;
-        if (isLoneQuote(token) || (meets && mayJoin(text_.token(at_ - 1), token))) {
-            argument.mustBeLexed = true;
-        }
-        return true;
+        argument.mustBeLexed = true;
+        return !isBlankOrNewline(text_.kind(at_));
     }
 
     const CppTokenScanner& list_;

@@ -5,8 +5,6 @@
 // a comma adds none: the last argument can not be empty, any other can.
 #include "macros/arguments.h"
 
-#include "lex/token_join.h"
-
 namespace umpre {
 
 using enum TokenKind;
@@ -88,12 +86,9 @@ TokenKind ArgumentCollector::readArgument(const Token& first, Argument& argument
 
 void ArgumentCollector::append(Argument& argument, const Token& token) {
     LexedText& text = argument.raw.text.edit();
-    const bool meets = argument.raw.last > argument.raw.first;
-    if (isLoneQuote(token) || (meets && mayJoin(text.token(text.size() - 1), token))) {
-        argument.mustBeLexed = true;
-    }
     const bool isKnown = !isName(token.kind) || token.name != nullptr;
     text.append(token.kind, token.text, isKnown ? token.name : macros_.findEntry(token.text));
+    argument.mustBeLexed = argument.mustBeLexed || !text.isClean(text.size() - 1);
     argument.raw.last = text.size();
 }
 

@@ -56,7 +56,7 @@ std::string MacroExpander::expandLine(std::string_view text, LineKind kind) {
     }
     sources_.endIsolation();
     lineKind_ = LineKind::Operand;
-    return result.tokens().joined();
+    return std::string(result.tokens().joined());
 }
 
 MacroExpander::Outcome MacroExpander::lookAt(const Token& token, MacroName*& name) {
@@ -102,14 +102,14 @@ bool MacroExpander::isText(const LexedText& text) const {
     if (text.hasEffects()) {
         return false;
     }
-    for (std::size_t index = 0; index < text.size(); ++index) {
-        const TokenKind kind = text.kind(index);
-        if (kind == NEWLINE || kind == KW_DEFINED
-            || (isName(kind) && mayBeMacro(text, index, macros_.filter()))) {
-            return false;
-        }
+    const auto isPlainName = [&](std::size_t index) {
+        return isName(text.kind(index)) && !mayBeMacro(text, index, macros_.filter());
+    };
+    std::size_t at = text.nextNotable(0, text.size());
+    while (at < text.size() && isPlainName(at)) {
+        at = text.nextNotable(at + 1, text.size());
     }
-    return true;
+    return at == text.size();
 }
 
 MacroExpander::Outcome MacroExpander::beginInvocation(const MacroName& name) {

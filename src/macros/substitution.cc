@@ -79,12 +79,11 @@ bool Substitution::isItsOwnExpansion(const Argument& argument) const {
         return false;
     }
     const TextSlice& raw = argument.raw;
-    for (std::size_t index = raw.first; index < raw.last; ++index) {
-        if (isName(raw.text->kind(index)) && mayBeMacro(*raw.text, index, macros_.filter())) {
-            return false;
-        }
+    std::size_t at = raw.text->nextNotable(raw.first, raw.last);
+    while (at < raw.last && !mayBeMacro(*raw.text, at, macros_.filter())) {
+        at = raw.text->nextNotable(at + 1, raw.last);
     }
-    return true;
+    return at == raw.last;
 }
 
 void Substitution::addJoined(Invocation& invocation, const BodyStep& step) {

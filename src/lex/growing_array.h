@@ -1,0 +1,81 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_LEX_GROWING_ARRAY_H
+#define UMPRE_LEX_GROWING_ARRAY_H
+
+#include <algorithm>
+#include <cstddef>
+#include <cstring>
+#include <memory>
+#include <type_traits>
+
+namespace umpre {
+
+/// An array that grows at its end by several elements at a time, which the caller then writes. What
+/// a `std::vector` would do beyond that (to set them to zero first, to ask for room for each) shows
+/// where tokens are copied in small groups.
+template <typename Element>
+class GrowingArray {
+    static_assert(std::is_trivially_copyable_v<Element>);
+
+public:
+    GrowingArray() = default;
+
+    GrowingArray(GrowingArray&& other) noexcept { swap(other); }
+
+    GrowingArray& operator=(GrowingArray&& other) noexcept {
+        swap(other);
+        return *this;
+    }
+
+    GrowingArray(const GrowingArray&) = delete;
+    GrowingArray& operator=(const GrowingArray&) = delete;
+    ~GrowingArray() = default;
+
+    void clear() noexcept { size_ = 0; }
+
+    /// Adds `count` elements and returns where they are to be written.
+    [[nodiscard]] Element* extend(std::size_t count) {
+        if (count > capacity_ - size_) {
+            grow(size_ + count);
+        }
+        Element* const added = elements_.get() + size_;
+        size_ += count;
+        return added;
+    }
+
+    [[nodiscard]] std::size_t size() const noexcept { return size_; }
+
+    [[nodiscard]] const Element* data() const noexcept { return elements_.get(); }
+
+    [[nodiscard]] Element& operator[](std::size_t index) noexcept { return elements_[index]; }
+
+    [[nodiscard]] const Element& operator[](std::size_t index) const noexcept {
+        return elements_[index];
+    }
+
+private:
+    void swap(GrowingArray& other) noexcept {
+        std::swap(elements_, other.elements_);
+        std::swap(size_, other.size_);
+        std::swap(capacity_, other.capacity_);
+    }
+
+    void grow(std::size_t needed) {
+        constexpr std::size_t kFirst = 32 / sizeof(Element);
+        const std::size_t capacity = std::max({needed, 2 * capacity_, kFirst});
+        auto larger = std::make_unique_for_overwrite<Element[]>(capacity);
+        if (size_ > 0) {
+            std::memcpy(larger.get(), elements_.get(), size_ * sizeof(Element));
+        }
+        elements_ = std::move(larger);
+        capacity_ = capacity;
+    }
+
+    std::unique_ptr<Element[]> elements_;
+    std::size_t size_ = 0;
+    std::size_t capacity_ = 0;
+};
+
+}  // namespace umpre
+
+#endif
