@@ -31,6 +31,9 @@ public:
     GrowingArray& operator=(const GrowingArray&) = delete;
     ~GrowingArray() = default;
 
+    /// So many elements behind the last one may be read and written, to no effect.
+    static constexpr std::size_t kSlack = 16 / sizeof(Element);
+
     void clear() noexcept { size_ = 0; }
 
     /// Adds `count` elements and returns where they are to be written.
@@ -63,7 +66,7 @@ private:
     void grow(std::size_t needed) {
         constexpr std::size_t kFirst = 32 / sizeof(Element);
         const std::size_t capacity = std::max({needed, 2 * capacity_, kFirst});
-        auto larger = std::make_unique_for_overwrite<Element[]>(capacity);
+        auto larger = std::make_unique_for_overwrite<Element[]>(capacity + kSlack);
         if (size_ > 0) {
             std::memcpy(larger.get(), elements_.get(), size_ * sizeof(Element));
         }

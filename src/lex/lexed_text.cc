@@ -61,7 +61,7 @@ void LexedText::append(const LexedText& other, std::size_t first, std::size_t la
     }
     const std::size_t shift = text_.size() - other.beginOf(first);  // may wrap
     const std::string_view text = other.joined(first, last);
-    std::memcpy(text_.extend(text.size()), text.data(), text.size());
+    copyText(text.data(), text.size());
     const std::size_t meeting = tokens_.size();
     Entry* const added = tokens_.extend(last - first);
     const Entry* const from = other.tokens_.data() + first;
@@ -71,16 +71,23 @@ void LexedText::append(const LexedText& other, std::size_t first, std::size_t la
     markUnclean(meeting);
 }
 
+// Copies from a text's own bytes, behind which there is some slack, as there is here.
+void LexedText::copyText(const char* from, std::size_t size) {
+    char* const to = text_.extend(size);
+    if (size > GrowingArray<char>::kSlack) {
+        std::memcpy(to, from, size);
+    } else if (size > 0) {
+        std::memcpy(to, from, GrowingArray<char>::kSlack);
+    }
+}
+
 // Most tokens are known to be clean by the bytes on the two sides of where they begin.
 void LexedText::markUnclean(std::size_t index) {
     const std::size_t begin = beginOf(index);
-    const std::uint8_t before = begin == 0 ? 0 : groupsOf(text_[begin - 1]);
-    const std::uint8_t after = begin == text_.size() ? kAlone : groupsOf(text_[begin]);
-    if ((before & after) != 0 || (after & kAlone) != 0) {
-        tokens_[index].set(Entry::kUnclean, isFoundUnclean(index));
-    } else {
-        tokens_[index].set(Entry::kUnclean, false);
-    }
+    const unsigned before = begin == 0 ? kAlone : groupsOf(text_[begin - 1]) | kAlone;
+    const unsigned after = begin == text_.size() ? kAlone : groupsOf(text_[begin]);
+    const bool isUnclean = (before & after) != 0 && isFoundUnclean(index);
+    tokens_[index].set(Entry::kUnclean, isUnclean);
 }
 
 bool LexedText::isFoundUnclean(std::size_t index) const {

@@ -136,6 +136,7 @@ private:
         return index == 0 ? 0 : tokens_[index - 1].end();
     }
 
+    void copyText(const char* from, std::size_t size);
     void markUnclean(std::size_t index);
     [[nodiscard]] bool isFoundUnclean(std::size_t index) const;
 

@@ -85,13 +85,7 @@ const NoExpandSet::Node* NoExpandSets::add(const Node* rest, const Name& name) {
     return &nodes_.back();
 }
 
-NoExpandSet NoExpandSets::united(NoExpandSet set, NoExpandSet other) {
-    if (set == other || other.node_ == nullptr) {
-        return set;
-    }
-    if (set.node_ == nullptr) {
-        return other;
-    }
+NoExpandSet NoExpandSets::unionOf(NoExpandSet set, NoExpandSet other) {
     const Key key{set.node_, other.node_};
     if (lastUnited_ != key) {
         const auto [entry, isNew] = unions_.try_emplace(key, set);

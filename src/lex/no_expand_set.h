@@ -68,8 +68,14 @@ public:
 
     /// Returns `set` and `name`.
     [[nodiscard]] NoExpandSet with(NoExpandSet set, const Name& name);
+
     /// Returns the names of both.
-    [[nodiscard]] NoExpandSet united(NoExpandSet set, NoExpandSet other);
+    [[nodiscard]] NoExpandSet united(NoExpandSet set, NoExpandSet other) {
+        if (set == other || other.node_ == nullptr) {
+            return set;
+        }
+        return set.node_ == nullptr ? other : unionOf(set, other);
+    }
 
 private:
     struct Key {
@@ -86,6 +92,7 @@ private:
 
     [[nodiscard]] bool holds(const Node& set, const Name& name);
     void mark(const Node& set);
+    [[nodiscard]] NoExpandSet unionOf(NoExpandSet set, NoExpandSet other);
     [[nodiscard]] NoExpandSet extend(NoExpandSet set, const Name& name);
     [[nodiscard]] const Node* add(const Node* rest, const Name& name);
 

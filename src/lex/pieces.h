@@ -37,14 +37,16 @@ public:
 
     /// Adds one token.
     void append(const Token& token, NoExpandSet noExpand) {
-        open().append(token.kind, token.text, token.name);
-        close(noExpand);
+        LexedText& tokens = open();
+        tokens.append(token.kind, token.text, token.name);
+        close(tokens.size(), noExpand);
     }
 
     /// Adds tokens `first` up to, not including, `last` of a text.
     void append(const LexedText& text, std::size_t first, std::size_t last, NoExpandSet noExpand) {
-        open().append(text, first, last);
-        close(noExpand);
+        LexedText& tokens = open();
+        tokens.append(text, first, last);
+        close(tokens.size(), noExpand);
     }
 
     /// Gives access for adding tokens, which `close` then makes a piece.
@@ -56,14 +58,7 @@ public:
     }
 
     /// Gives the tokens added since the last piece their set.
-    void close(NoExpandSet noExpand) {
-        const std::size_t end = open().size();
-        if (!runs_.empty() && runs_.back().noExpand == noExpand) {
-            runs_.back().end = end;
-        } else {
-            runs_.push_back({end, noExpand});
-        }
-    }
+    void close(NoExpandSet noExpand) { close(open().size(), noExpand); }
 
     /// Hands the tokens and their runs over, in exchange for memory to use again.
     void moveTo(SharedText& text, std::vector<Run>& runs) {
@@ -77,6 +72,14 @@ public:
     [[nodiscard]] const std::vector<Run>& runs() const noexcept { return runs_; }
 
 private:
+    void close(std::size_t end, NoExpandSet noExpand) {
+        if (!runs_.empty() && runs_.back().noExpand == noExpand) {
+            runs_.back().end = end;
+        } else {
+            runs_.push_back({end, noExpand});
+        }
+    }
+
     SharedText text_;
     std::vector<Run> runs_;
 };

@@ -1,7 +1,6 @@
 // SPDX-License-Identifier: MIT
 #include "lex/text_outline.h"
 
-
 namespace umpre {
 namespace {
 

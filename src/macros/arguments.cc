@@ -87,7 +87,7 @@ TokenKind ArgumentCollector::readArgument(const Token& first, Argument& argument
 void ArgumentCollector::append(Argument& argument, const Token& token) {
     LexedText& text = argument.raw.text.edit();
     const bool isKnown = !isName(token.kind) || token.name != nullptr;
-    text.append(token.kind, token.text, isKnown ? token.name : macros_.findEntry(token.text));
+    text.append(token.kind, token.text, isKnown ? token.name : &macros_.noteOf(token.text));
     argument.mustBeLexed = argument.mustBeLexed || !text.isClean(text.size() - 1);
     argument.raw.last = text.size();
 }

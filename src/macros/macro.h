@@ -54,6 +54,7 @@ private:
     std::size_t parametersSize_ = 0;
     std::uint32_t parameterCount_ = 0;
     bool functionLike_ = false;
+    bool wasDefined_ = false;  // now or earlier
 };
 
 /// A name that was defined at least once, and its last definition.

@@ -71,7 +71,7 @@ MacroExpander::Outcome MacroExpander::lookAt(const Token& token, MacroName*& nam
 }
 
 MacroName* MacroExpander::entryOf(const Token& token) {
-    if (token.name == nullptr || sources_.plainRoad()) {
+    if (token.name == nullptr || token.name->text.empty() || sources_.plainRoad()) {
         return macros_.find(token.text);
     }
     return token.name->isDefined ? &MacroTable::entryOf(*token.name) : nullptr;

@@ -15,7 +15,7 @@ constexpr std::size_t kFirstSlots = 256;
 
 }  // namespace
 
-MacroTable::MacroTable() : slots_(kFirstSlots) {}
+MacroTable::MacroTable() : slots_(kFirstSlots), unknown_(1) {}
 
 MacroName* MacroTable::find(std::string_view name) {
     MacroName* const entry = findEntry(name);
@@ -27,10 +27,19 @@ MacroName* MacroTable::findEntry(std::string_view name) {
     return slot.number == 0 ? nullptr : &nameIn(slot);
 }
 
+Name& MacroTable::noteOf(std::string_view name) {
+    MacroName* const entry = filter_.mayHold(name) ? findEntry(name) : nullptr;
+    if (entry != nullptr) {
+        return *entry;
+    }
+    unknownIsNoted_ = true;
+    return unknown_.back();
+}
+
 void MacroTable::setNames(LexedText& text, std::size_t first) {
     for (std::size_t index = first; index < text.size(); ++index) {
         if (isName(text.kind(index))) {
-            text.setName(index, findEntry(text.text(index)));
+            text.setName(index, &noteOf(text.text(index)));
         }
     }
 }
@@ -78,7 +87,19 @@ void MacroTable::replace(MacroName& name, const MacroText& definition) {
     macro.body.reset();
     macro.wasUsed = false;
     name.isDefined = true;
+    if (!macro.wasDefined_) {
+        macro.wasDefined_ = true;
+        addToFilter(name);
+    }
+}
+
+void MacroTable::addToFilter(const Name& name) {
     filter_.add(name.text);
+    if (unknownIsNoted_) {
+        unknown_.back().isDefined = true;
+        unknown_.emplace_back();
+        unknownIsNoted_ = false;
+    }
 }
 
 void MacroTable::undefine(std::string_view name) {

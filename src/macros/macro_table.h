@@ -5,6 +5,7 @@
 #include <array>
 #include <cstddef>
 #include <cstdint>
+#include <deque>
 #include <memory>
 #include <memory_resource>
 #include <string_view>
@@ -30,14 +31,18 @@ public:
 
     /// Returns the entry of a name that was defined or entered at least once, otherwise null.
     [[nodiscard]] MacroName* findEntry(std::string_view name);
+    /// Returns what is noted in a text for a name: its entry or, if it was never defined, one
+    /// without text that stands for all such names. That one counts as defined once another name
+    /// was, because it may be that name.
+    [[nodiscard]] Name& noteOf(std::string_view name);
 
-    /// Returns the entry that a name noted in a text belongs to.
+    /// Returns the entry that was noted in a text.
     [[nodiscard]] static MacroName& entryOf(Name& name) noexcept {
         // NOLINTNEXTLINE(cppcoreguidelines-pro-type-static-cast-downcast): the table makes no other
         return static_cast<MacroName&>(name);
     }
 
-    /// Notes in a text, from token `first` on, the entries of those of its names that have one.
+    /// Notes in a text, from token `first` on, what is known of its names.
     void setNames(LexedText& text, std::size_t first = 0);
     /// Notes in a text the entries of its names, making those that are missing.
     void enterNames(LexedText& text);
@@ -74,6 +79,7 @@ private:
     [[nodiscard]] std::size_t slotOf(std::string_view name, std::uint32_t hash) const;
     [[nodiscard]] MacroName& enter(std::string_view name);
     [[nodiscard]] char* newBytes(std::size_t size);
+    void addToFilter(const Name& name);
     void grow();
 
     std::pmr::monotonic_buffer_resource bytes_;  // of names and definitions
@@ -81,6 +87,8 @@ private:
     std::size_t nameCount_ = 0;
     std::vector<Slot> slots_;  // open addressing; at most three of four are taken
     NameFilter filter_;
+    std::deque<Name> unknown_;  // the last one stands for what was never defined
+    bool unknownIsNoted_ = false;
 };
 
 }  // namespace umpre
