@@ -12,6 +12,7 @@ build_packages=(
     "ninja-build|ninja|runs the build"
     "flex|flex|makes the scanner from its rules"
     "libfl-dev|/usr/include/FlexLexer.h|the scanner's header"
+    "libsimde-dev|/usr/include/simde/x86/sse2.h|SSE2 on every machine"
 )
 test_packages=(
     "python3|python3|runs the golden cases"

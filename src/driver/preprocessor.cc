@@ -11,6 +11,7 @@
 namespace umpre {
 
 using enum TokenKind;
+using Stop = TextReader::Stop;
 
 Preprocessor::Preprocessor(DiagnosticSink diagnostics, const RunOptions& options)
     : options_(options),
@@ -22,7 +23,8 @@ Preprocessor::Preprocessor(DiagnosticSink diagnostics, const RunOptions& options
       definitions_(sources_, macros_, diagnostics_),
       inclusion_(sources_, expander_, lexer_, diagnostics_),
       lineControl_(sources_, expander_, lexer_, output_, diagnostics_),
-      textReader_(output_, macros_.filter()) {
+      textReader_(output_, macros_.filter()),
+      lineSkipper_(output_) {
     definePredefinedMacros(macros_);
 }
 
@@ -79,14 +81,17 @@ bool Preprocessor::readBytes() {
         return false;
     }
     if (conditionals_.skipping()) {
-        if (textReader_.skipText(*file) == TextReader::Stop::LineStart) {
+        if (lineSkipper_.skip(*file, Stop::LineStart) == Stop::LineStart) {
             return readDirective(*file);
         }
         endSkippedLine();
     } else {
-        if (textReader_.copyText(*file, TextReader::Stop::LineStart)
-            == TextReader::Stop::LineStart) {
+        const Stop stop = textReader_.copyText(*file, Stop::LineStart);
+        if (stop == Stop::LineStart) {
             return readDirective(*file);
+        }
+        if (stop == Stop::Name) {
+            writeToken(textReader_.name());
         }
         restOfTextLine();
     }
@@ -183,10 +188,14 @@ void Preprocessor::textLine(std::string_view blanks, Token first) {
 void Preprocessor::restOfTextLine() {
     while (!output_.failed()) {
         CppFileScanner* const file = byteSource();
-        if (file != nullptr
-            && textReader_.copyText(*file, TextReader::Stop::InLine)
-                   == TextReader::Stop::LineStart) {
+        const Stop stop =
+            file == nullptr ? Stop::InLine : textReader_.copyText(*file, Stop::InLine);
+        if (stop == Stop::LineStart) {
             return;
+        }
+        if (stop == Stop::Name) {
+            writeToken(textReader_.name());
+            continue;
         }
         const std::string_view text = expander_.takeText();
         if (!text.empty()) {
@@ -209,9 +218,18 @@ void Preprocessor::writeToken(const Token& token) {
     output_.write(isName(token.kind) ? expander_.expandName(token) : token.text);
 }
 
+// Reads at least one token.
 void Preprocessor::endSkippedLine() {
-    sources_.skipToEndOfLine();
-    output_.endLine();
+    while (!output_.failed()) {
+        CppFileScanner* const file = byteSource();
+        if (file != nullptr && lineSkipper_.skip(*file, Stop::InLine) == Stop::LineStart) {
+            return;
+        }
+        if (endsLine(sources_.next().kind)) {
+            output_.endLine();
+            return;
+        }
+    }
 }
 
 void Preprocessor::fileEntered() {

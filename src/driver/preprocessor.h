@@ -12,6 +12,7 @@
 #include "driver/diagnostics.h"
 #include "lex/byte_sink.h"
 #include "lex/directive_line.h"
+#include "lex/line_skipper.h"
 #include "lex/output_writer.h"
 #include "lex/run_options.h"
 #include "lex/scanner_stack.h"
@@ -93,6 +94,7 @@ private:
     Inclusion inclusion_;
     LineControl lineControl_;
     TextReader textReader_;
+    LineSkipper lineSkipper_;
 };
 
 }  // namespace umpre

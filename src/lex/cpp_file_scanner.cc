@@ -6,7 +6,7 @@
 namespace umpre {
 
 CppFileScanner::CppFileScanner(CommentSink& commentSink, const RunOptions& options)
-    : input_(options.windowSize), lexer_(commentSink, options) {}
+    : input_(options), lexer_(commentSink, options) {}
 
 bool CppFileScanner::open(const std::string& fileName) {
     if (fileName.empty()) {

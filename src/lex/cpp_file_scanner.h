@@ -8,6 +8,7 @@
 #include "lex/cpp_lexer.h"
 #include "lex/cpp_scanner.h"
 #include "lex/input_buffer.h"
+#include "lex/literal.h"
 #include "lex/source_position.h"
 
 namespace umpre {
@@ -38,8 +39,13 @@ public:
 
     [[nodiscard]] bool isFile() const noexcept override { return true; }
 
-    /// For readers of bytes: the whole lines that lie ahead; empty at the end of the file, and
-    /// while a token is looked ahead at.
+    /// For readers of bytes: what lies ahead in memory, up to a place where a token begins; empty
+    /// at the end of the file, and while a token is looked ahead at.
+    [[nodiscard]] std::string_view bytesAhead() {
+        return hasPeek() ? std::string_view{} : lexer_.bytesAhead();
+    }
+
+    /// Returns the whole lines among the bytes ahead; at the end of the file, all of them.
     [[nodiscard]] std::string_view wholeLines() {
         return hasPeek() ? std::string_view{} : lexer_.wholeLines();
     }
@@ -47,8 +53,10 @@ public:
     /// Returns the size of the literal that begins at this place of `wholeLines()`, or 0.
     [[nodiscard]] std::size_t literalSize(const char* quote) { return lexer_.literalSize(quote); }
 
-    /// Passes over bytes of `wholeLines()`, up to the beginning of a token, `lines` line ends among
-    /// them.
+    /// Returns the finder of literals among the bytes ahead.
+    [[nodiscard]] LiteralFinder& literals() noexcept { return lexer_.literals(); }
+
+    /// Passes over bytes ahead, up to the beginning of a token, `lines` line ends among them.
     void advance(std::size_t bytes, std::size_t lines, bool endsWithLineEnd);
 
 private:

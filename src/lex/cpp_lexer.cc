@@ -8,18 +8,19 @@
 #include <array>
 #include <cassert>
 
+#include "lex/comment.h"
 #include "lex/literal.h"
 #include "lex/source_position.h"
+#include "lex/spelling.h"
 
 namespace umpre {
+
+using Need = InputBuffer::Need;
+
 namespace {
 
 // The text of every comment's token; the generated scanner wants a pointer to non-const.
 std::array<char, 2> blank{' ', '\0'};
-
-[[nodiscard]] bool isLineEnd(char byte) noexcept {
-    return byte == '\n' || byte == '\r';
-}
 
 }  // namespace
 
@@ -33,13 +34,13 @@ CppLexer::CppLexer(CommentSink& commentSink, const RunOptions& options)
 void CppLexer::read(InputBuffer& input) {
     input_ = &input;
     line_ = 1;
-    yy_c_buf_p = lineLimit_ = input.begin();  // the first call of `lex` reads the first window
+    yy_c_buf_p = limit_ = input.begin();  // the first call of `lex` reads the first window
 }
 
 void CppLexer::scan(char* begin, char* end) {
     input_ = nullptr;
     line_ = 1;
-    lineLimit_ = end;
+    limit_ = end;
     install(begin, end);
 }
 
@@ -49,8 +50,19 @@ bool CppLexer::refill(char* position, InputBuffer::Need need) {
     }
     const bool more = input_->refill(position, need);
     install(input_->begin(), input_->end());
-    lineLimit_ = input_->lineLimit();
+    limit_ = input_->limit();
     return more;
+}
+
+// Reads more of the input, behind what `position` and its followers are. Returns false if there is
+// no more.
+bool CppLexer::readOn(char*& position, InputBuffer::Need need) {
+    if (input_ == nullptr || input_->isEnded()) {
+        return false;
+    }
+    (void)refill(position, need);
+    position = yy_c_buf_p;
+    return true;
 }
 
 void CppLexer::moveTo(char* position) noexcept {
@@ -59,7 +71,7 @@ void CppLexer::moveTo(char* position) noexcept {
 }
 
 Token CppLexer::lex() {
-    if (yy_c_buf_p >= lineLimit_ && !refill(yy_c_buf_p, InputBuffer::Need::Line)) {
+    if (yy_c_buf_p >= limit_ && !refill(yy_c_buf_p, Need::Tokens)) {
         return {};
     }
     if (!plainRoad_ && (yy_hold_char == '"' || yy_hold_char == '\'')) {
@@ -75,42 +87,47 @@ Token CppLexer::lex() {
 }
 
 // The two literal rules, by hand: the generated scanner starts a long literal anew at each zero
-// byte in it, and tries each quote of a line of unclosed quotes up to the line's end. That a quote
-// is unclosed is found only once: a later quote of that kind before the same line end was passed by
-// the first attempt as half of an escaped pair, so its own attempt would go the same way.
-std::size_t CppLexer::literalSize(const char* quote) {
-    Unclosed& unclosed = *quote == '"' ? unclosedStrings_ : unclosedCharacters_;
-    if (quote >= unclosed.begin && quote < unclosed.end) {
-        return 0;
-    }
-    const LiteralScan literal = scanLiteral(quote, end_);
-    if (!literal.isClosed) {
-        unclosed = {quote, literal.end};
-        return 0;
-    }
-    return static_cast<std::size_t>(literal.end - quote);
-}
-
+// byte in it, and tries each quote of a line of unclosed quotes up to the line's end.
 Token CppLexer::quoted() {
+    using Result = LiteralScan::Result;
+    LiteralScan literal{};
+    do {
+        const bool isLast = input_ == nullptr || input_->isEnded();
+        literal = literals_.find(yy_c_buf_p, end_, isLast);
+    } while (literal.result == Result::Cut && readOn(yy_c_buf_p, Need::Double));
     char* const begin = yy_c_buf_p;
-    const std::size_t size = literalSize(begin);
-    if (size == 0) {
+    if (literal.result != Result::Closed) {
         moveTo(begin + 1);
         return {TokenKind::OTHER, {begin, 1}};
     }
+    const auto size = static_cast<std::size_t>(literal.end - begin);
     moveTo(begin + size);
     return {*begin == '"' ? TokenKind::STRING_LITERAL : TokenKind::CHAR_LITERAL, {begin, size}};
 }
 
-std::string_view CppLexer::wholeLines() {
-    if (yy_c_buf_p >= lineLimit_ && !refill(yy_c_buf_p, InputBuffer::Need::Line)) {
+std::string_view CppLexer::bytesAhead() {
+    if (yy_c_buf_p >= limit_ && !refill(yy_c_buf_p, Need::Tokens)) {
         return {};
     }
-    return {yy_c_buf_p, static_cast<std::size_t>(lineLimit_ - yy_c_buf_p)};
+    return {yy_c_buf_p, static_cast<std::size_t>(limit_ - yy_c_buf_p)};
+}
+
+std::string_view CppLexer::wholeLines() {
+    const std::string_view ahead = bytesAhead();
+    const bool isWhole = input_ == nullptr || input_->isEnded();
+    // Limits stand within a line only if no line ends before them.
+    return isWhole || (!ahead.empty() && ahead.back() == '\n') ? ahead : std::string_view{};
+}
+
+std::size_t CppLexer::literalSize(const char* quote) {
+    const LiteralScan literal = literals_.find(quote, end_, false);
+    return literal.result == LiteralScan::Result::Closed
+               ? static_cast<std::size_t>(literal.end - quote)
+               : 0;
 }
 
 void CppLexer::advance(std::size_t bytes, std::size_t lines) {
-    assert(bytes <= static_cast<std::size_t>(lineLimit_ - yy_c_buf_p));
+    assert(bytes <= static_cast<std::size_t>(limit_ - yy_c_buf_p));
     moveTo(yy_c_buf_p + bytes);
     line_ = addLines(line_, lines);
 }
@@ -126,37 +143,31 @@ TokenKind CppLexer::continuation() {
 }
 
 TokenKind CppLexer::blockComment() {
+    using Stop = CommentScan::Stop;
     *yy_c_buf_p = yy_hold_char;
     char* at = yy_c_buf_p;
     std::size_t lineEnds = 0;
-    bool star = false;
-    bool closed = false;
-    // To the next byte, or false at the end of the input; reading on moves the bytes.
-    const auto more = [&] {
-        if (at == end_ && input_ != nullptr) {
-            (void)refill(at, InputBuffer::Need::Bytes);
-            at = yy_c_buf_p;
-        }
-        return at != end_;
-    };
-    while (!closed && more()) {
-        const char byte = *at++;
-        if (isLineEnd(byte)) {
-            if (byte == '\r' && more() && *at == '\n') {
-                ++at;
-            }
+    CommentScan scan{};
+    do {
+        scan = scanBlockComment(at, end_);
+        at += scan.at - at;
+        lineEnds += scan.lineFeeds;
+        if (scan.stop == Stop::CarriageReturn) {
             ++lineEnds;
+            if (at + 1 == end_) {
+                (void)readOn(at, Need::Bytes);
+            }
+            at += at[1] == '\n' ? 2 : 1;
         }
-        closed = star && byte == '/';
-        star = byte == '*';
-    }
-    moveTo(at);
+    } while (scan.stop == Stop::CarriageReturn
+             || (scan.stop == Stop::Cut && readOn(at, Need::Bytes)));
+    moveTo(scan.stop == Stop::Closed ? at : end_);
     yytext = blank.data();
     line_ = addLines(line_, lineEnds);
     if (lineEnds > 0) {
         commentSink_.commentLineEnds(lineEnds);
     }
-    if (!closed) {
+    if (scan.stop != Stop::Closed) {
         commentSink_.unterminatedComment(line_);
     }
     return TokenKind::WHITESPACE;
@@ -165,11 +176,12 @@ TokenKind CppLexer::blockComment() {
 TokenKind CppLexer::lineComment() {
     *yy_c_buf_p = yy_hold_char;
     char* at = yy_c_buf_p;
-    while (at < end_ && !isLineEnd(*at)) {
-        ++at;
-    }
-    if (at + 1 == end_ && *at == '\r') {
-        ++at;  // a carriage return that ends the input ends no line
+    const auto isKnown = [&] { return at != end_ && (*at == '\n' || at + 1 != end_); };
+    do {
+        at += findLineEnd(at, end_) - at;
+    } while (!isKnown() && readOn(at, Need::Bytes));
+    if (!isKnown()) {
+        at = end_;  // a carriage return that ends the input ends no line
     }
     moveTo(at);
     yytext = blank.data();

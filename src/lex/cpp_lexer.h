@@ -13,6 +13,7 @@
 
 #include "lex/comment_sink.h"
 #include "lex/input_buffer.h"
+#include "lex/literal.h"
 #include "lex/run_options.h"
 #include "lex/token.h"
 
@@ -39,13 +40,20 @@ public:
 
     void setLine(std::int32_t line) noexcept { line_ = line; }
 
-    /// For readers of bytes: what lies ahead in memory, in whole lines; empty at the end of input.
+    /// For readers of bytes: what lies ahead in memory, up to a place where a token begins; empty
+    /// at the end of input. 64 bytes behind it and 8 before it can be read.
+    [[nodiscard]] std::string_view bytesAhead();
+    /// Returns the whole lines among the bytes ahead; at the end of input, all of them.
     [[nodiscard]] std::string_view wholeLines();
+
     /// Returns the size of the literal that the quote at this place of `wholeLines()` opens, or 0
     /// if its line does not close it; the quote is then a token by itself.
     [[nodiscard]] std::size_t literalSize(const char* quote);
-    /// Passes over bytes of `wholeLines()`, up to the beginning of a token, `lines` line ends among
-    /// them.
+
+    /// Returns the finder of literals among the bytes ahead.
+    [[nodiscard]] LiteralFinder& literals() noexcept { return literals_; }
+
+    /// Passes over bytes ahead, up to the beginning of a token, `lines` line ends among them.
     void advance(std::size_t bytes, std::size_t lines);
 
 private:
@@ -62,21 +70,14 @@ private:
     void install(char* begin, char* end);
     void moveTo(char* position) noexcept;
     [[nodiscard]] bool refill(char* position, InputBuffer::Need need);
+    [[nodiscard]] bool readOn(char*& position, InputBuffer::Need need);
     [[nodiscard]] Token quoted();
 
     CommentSink& commentSink_;
     InputBuffer* input_ = nullptr;  // null while a text is scanned
     char* end_ = nullptr;           // of the bytes in memory
-    char* lineLimit_ = nullptr;     // of the whole lines among them
-
-    // Between which places quotes of each kind are known to be unclosed.
-    struct Unclosed {
-        const char* begin = nullptr;
-        const char* end = nullptr;
-    };
-
-    Unclosed unclosedStrings_;
-    Unclosed unclosedCharacters_;
+    char* limit_ = nullptr;         // of what can be scanned of them
+    LiteralFinder literals_;
     bool plainRoad_;
     std::int32_t line_ = 1;
 };

@@ -2,11 +2,12 @@
 //
 // Reads in windows. The window of "ab\ncd\nef" with room for eight bytes is
 //
-//     a b \n c d \n e f 0 0        lineLimit() behind the second line feed
+//     a b \n c d \n e f 0 0        limit() behind the second line feed
 //
-// and once the two lines are used up, "ef" moves to the front and reading goes on behind it. A line
-// that is longer than the window makes the window grow, by doubling, so that every byte is moved a
-// constant number of times.
+// and once the two lines are used up, "ef" moves to the front and reading goes on behind it. Where
+// no line ends in a full window, the limit stands between two bytes that no token holds together.
+// A token that is longer than the window makes the window grow, by doubling, so that every byte is
+// moved a constant number of times.
 #include "lex/input_buffer.h"
 
 #include <algorithm>
@@ -15,16 +16,31 @@
 #include <cstring>
 #include <fcntl.h>
 #include <new>
+#include <string_view>
 #include <sys/stat.h>
 #include <unistd.h>
 
 #include "lex/scanner_failure.h"
+#include "lex/spelling.h"
 
 namespace umpre {
 namespace {
 
-// The generated scanner wants two zero bytes; readers of several bytes at a time may look further.
-constexpr std::size_t kPadding = 64;
+// What the reader of several bytes at a time may read besides the bytes; the generated scanner
+// wants two of those behind to be zero.
+constexpr std::size_t kFront = 8;
+constexpr std::size_t kBack = 64;
+
+// Tells whether a token ends between two neighbours wherever they stand, comments and literals
+// aside.
+[[nodiscard]] bool isSplit(char before, char behind) noexcept {
+    constexpr std::string_view kBeginsTwo = "#|&=!<>/\\";
+    if (before == '\r') {
+        return behind != '\n';
+    }
+    return kBeginsTwo.find(before) == std::string_view::npos
+           && !(isWordByte(before) && isWordByte(behind));
+}
 
 }  // namespace
 
@@ -78,6 +94,7 @@ void InputBuffer::close() {
     }
     if (capacity_ > 2 * windowSize_) {
         data_.reset();
+        begin_ = nullptr;
         capacity_ = 0;
     }
     reset();
@@ -85,7 +102,7 @@ void InputBuffer::close() {
 
 void InputBuffer::reset() {
     filled_ = 0;
-    lineLimit_ = 0;
+    limit_ = 0;
     descriptor_ = -1;
     owned_ = false;
     ended_ = true;
@@ -95,43 +112,66 @@ void InputBuffer::reset() {
 }
 
 bool InputBuffer::refill(char*& position, Need need) {
-    if (data_ != nullptr && position != begin()) {
-        const auto kept = static_cast<std::size_t>(end() - position);
-        std::memmove(begin(), position, kept);
+    const auto kept = static_cast<std::size_t>(end() - position);
+    if (position != begin_) {
+        std::memmove(begin_, position, kept);
         filled_ = kept;
     }
-    bool enough = false;
+    limit_ = 0;
+    std::size_t searched = 0;
+    // A comment or a literal that reached across the limit may have left something to scan.
+    bool enough = need == Need::Tokens && findLimit(searched);
     while (!enough && !ended_) {
-        const std::size_t before = filled_;
-        const std::size_t count = readOnce();
-        const void* const lineEnd = ::memrchr(begin() + before, '\n', count);
-        if (readAtOnce_) {
-            continue;
-        }
-        if (lineEnd != nullptr) {
-            lineLimit_ = static_cast<std::size_t>(static_cast<const char*>(lineEnd) - begin()) + 1;
-            enough = true;
-        } else if (need == Need::Bytes && count > 0) {
-            lineLimit_ = 0;
-            enough = true;
-        }
+        readOnce();
+        enough = !readAtOnce_ && hasCome(need, kept, searched);
     }
     terminate();
-    position = begin();
+    position = begin_;
     return filled_ > 0;
 }
 
-std::size_t InputBuffer::readOnce() {
+bool InputBuffer::hasCome(Need need, std::size_t kept, std::size_t& searched) {
+    switch (need) {
+    case Need::Tokens: return findLimit(searched);
+    case Need::Bytes: return filled_ > kept;
+    case Need::Double: return filled_ >= 2 * kept && filled_ > kept;
+    }
+    return true;
+}
+
+// Looks for a limit behind the first `searched` bytes, which have none. Returns false if there is
+// none, or only one within a line that may yet end in this window.
+bool InputBuffer::findLimit(std::size_t& searched) {
+    const void* const lineEnd = ::memrchr(begin_ + searched, '\n', filled_ - searched);
+    if (lineEnd != nullptr) {
+        limit_ = static_cast<std::size_t>(static_cast<const char*>(lineEnd) - begin_) + 1;
+        return true;
+    }
+    if (splitsLines_ && filled_ >= windowSize_) {
+        const std::size_t first = searched < windowSize_ ? 1 : searched;
+        for (std::size_t at = filled_ - 1; at >= first; --at) {
+            if (isSplit(begin_[at - 1], begin_[at])) {
+                limit_ = at;
+                return true;
+            }
+        }
+    }
+    searched = filled_;
+    return false;
+}
+
+void InputBuffer::readOnce() {
     std::size_t wanted = windowSize_;
     if (sizeKnown_) {
         wanted = static_cast<std::size_t>(std::min<std::uint64_t>(unread_, windowSize_));
     }
     if (filled_ + wanted > capacity_) {
-        // Room for the window; after that, twice as much each time.
-        wanted = std::max(wanted, filled_);
-        reserve(filled_ + wanted);
+        // Room for the window and the line that it begins in; after that, twice as much each time.
+        reserve(filled_ == 0 && wanted < windowSize_
+                    ? wanted
+                    : filled_ + std::max(wanted + wanted / 4, filled_));
     }
-    std::size_t room = capacity_ - filled_;
+    std::size_t room = std::min(capacity_ - filled_, std::max(windowSize_, filled_));
     if (sizeKnown_) {
         room = static_cast<std::size_t>(std::min<std::uint64_t>(unread_, room));
     }
@@ -147,12 +187,11 @@ std::size_t InputBuffer::readOnce() {
         unread_ -= static_cast<std::uint64_t>(count);
     }
     ended_ = count == 0 || (sizeKnown_ && unread_ == 0);
-    return static_cast<std::size_t>(count);
 }
 
 void InputBuffer::terminate() {
     if (ended_) {
-        lineLimit_ = filled_;
+        limit_ = filled_;
     }
     if (data_ == nullptr) {
         reserve(0);
@@ -165,12 +204,13 @@ void InputBuffer::reserve(std::size_t capacity) {
         return;
     }
     // NOLINTNEXTLINE(cppcoreguidelines-no-malloc): realloc moves large windows without a copy
-    void* const memory = std::realloc(data_.get(), capacity + kPadding);
+    void* const memory = std::realloc(data_.get(), kFront + capacity + kBack);
     if (memory == nullptr) {
         throw std::bad_alloc();
     }
     (void)data_.release();
     data_.reset(static_cast<char*>(memory));
+    begin_ = data_.get() + kFront;
     capacity_ = capacity;
 }
 

@@ -8,18 +8,28 @@
 #include <string>
 #include <string_view>
 
+#include "lex/run_options.h"
+
 namespace umpre {
 
-/// The bytes of a file, of standard input or of a text, in windows. A window holds whole lines up
-/// to `lineLimit()`, so no token but a block comment reaches from one window into the next; behind
-/// it the beginning of the next line may stand. Two zero bytes follow the end, as the generated
-/// scanner wants them.
+/// The bytes of a file, of standard input or of a text, in windows. A window can be scanned up to
+/// `limit()`, where a token begins: behind the last line end, or within a line that is longer than
+/// the window. Of the tokens in front of it only comments and literals may reach across; bytes
+/// behind it may already be there. Two zero bytes follow the end, as the generated scanner wants
+/// them, and readers of several bytes at a time may read 64 bytes behind it and 8 before the
+/// beginning.
 class InputBuffer {
 public:
     /// What a refill has to bring.
-    enum class Need { Bytes, Line };
+    enum class Need {
+        Tokens,  ///< something to scan
+        Bytes,   ///< something
+        Double,  ///< as much again as is kept
+    };
 
-    explicit InputBuffer(std::size_t windowSize) noexcept : windowSize_(windowSize) {}
+    /// On the plain road limits stand at line ends only.
+    explicit InputBuffer(const RunOptions& options) noexcept
+        : windowSize_(options.windowSize), splitsLines_(!options.plainRoad) {}
 
     InputBuffer(const InputBuffer&) = delete;
     InputBuffer& operator=(const InputBuffer&) = delete;
@@ -35,12 +45,15 @@ public:
     void openText(std::string_view text);
     void close();
 
-    [[nodiscard]] char* begin() noexcept { return data_.get(); }
+    [[nodiscard]] char* begin() noexcept { return begin_; }
 
-    [[nodiscard]] char* end() noexcept { return data_.get() + filled_; }
+    [[nodiscard]] char* end() noexcept { return begin_ + filled_; }
 
-    /// Returns the end of the last whole line; at the end of the input, the end of the bytes.
-    [[nodiscard]] char* lineLimit() noexcept { return data_.get() + lineLimit_; }
+    /// Returns the end of what can be scanned; at the end of the input, the end of the bytes.
+    [[nodiscard]] char* limit() noexcept { return begin_ + limit_; }
+
+    /// Tells whether nothing follows the bytes in memory.
+    [[nodiscard]] bool isEnded() const noexcept { return ended_; }
 
     /// Drops what stands before `position`, moves the rest to the front and reads on until what is
     /// needed has come or the input ends. Sets `position` to where its byte is now. Returns false
@@ -50,7 +63,9 @@ public:
 private:
     void reset();
     void reserve(std::size_t capacity);
-    [[nodiscard]] std::size_t readOnce();
+    [[nodiscard]] bool hasCome(Need need, std::size_t kept, std::size_t& searched);
+    [[nodiscard]] bool findLimit(std::size_t& searched);
+    void readOnce();
     void terminate();
 
     struct Free {
@@ -58,10 +73,12 @@ private:
     };
 
     std::size_t windowSize_;
+    bool splitsLines_;
     std::unique_ptr<char, Free> data_;
-    std::size_t capacity_ = 0;  // without the zero bytes behind
+    char* begin_ = nullptr;     // of the bytes, within the memory
+    std::size_t capacity_ = 0;  // without the bytes around it
     std::size_t filled_ = 0;
-    std::size_t lineLimit_ = 0;
+    std::size_t limit_ = 0;
     int descriptor_ = -1;
     bool owned_ = false;
     bool ended_ = true;

@@ -6,31 +6,55 @@ namespace umpre {
 
 /// How far a string or character literal goes.
 struct LiteralScan {
-    const char* end;  ///< behind its closing quote; if it is not closed, where that showed
-    bool isClosed;
+    enum class Result {
+        Closed,  ///< it ends behind its closing quote
+        Open,    ///< its line does not close it: the quote is a token by itself
+        Cut,     ///< the bytes at hand do not tell
+    };
+
+    Result result;
+    const char* end;  ///< behind the literal; if it is not closed, where that showed
 };
 
 /// Reads the literal whose opening quote stands at `at`, by the two literal rules: characters other
 /// than line feeds, a backslash with one that is no line end, and at least one in a character
-/// literal. Bytes are read up to `end`.
-[[nodiscard]] inline LiteralScan scanLiteral(const char* at, const char* end) noexcept {
-    const char quote = *at++;
-    if (quote == '\'' && at < end && *at == quote) {
-        return {at, false};
-    }
-    for (; at < end && *at != '\n'; ++at) {
-        if (*at == quote) {
-            return {at + 1, true};
+/// literal. Reads up to `end`.
+[[nodiscard]] LiteralScan scanLiteral(const char* at, const char* end) noexcept;
+
+/// Finds literals, and remembers between which places quotes are known to be open. That is found
+/// only once for a line: a later quote of that kind before the same line end was passed by the
+/// first attempt as half of an escaped pair, so its own attempt would go the same way.
+class LiteralFinder {
+public:
+    /// Reads as `scanLiteral` does. If `isLast`, nothing follows the bytes up to `end`, and no
+    /// literal is cut.
+    [[nodiscard]] LiteralScan find(const char* quote, const char* end, bool isLast) noexcept {
+        Range& open = *quote == '"' ? openStrings_ : openCharacters_;
+        if (quote >= open.begin && quote < open.end) {
+            return {LiteralScan::Result::Open, open.end};
         }
-        if (*at == '\\') {
-            if (at + 1 == end || at[1] == '\n' || at[1] == '\r') {
-                break;
-            }
-            ++at;
+        LiteralScan scan = scanLiteral(quote, end);
+        if (scan.result == LiteralScan::Result::Cut && isLast) {
+            scan.result = LiteralScan::Result::Open;
         }
+        if (scan.result == LiteralScan::Result::Open) {
+            open = {quote, scan.end};
+        }
+        return scan;
     }
-    return {at, false};
-}
+
+    /// Must be called when the bytes move.
+    void forget() noexcept { openStrings_ = openCharacters_ = {}; }
+
+private:
+    struct Range {
+        const char* begin = nullptr;
+        const char* end = nullptr;
+    };
+
+    Range openStrings_;
+    Range openCharacters_;
+};
 
 }  // namespace umpre
 

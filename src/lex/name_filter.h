@@ -2,6 +2,8 @@
 #ifndef UMPRE_LEX_NAME_FILTER_H
 #define UMPRE_LEX_NAME_FILTER_H
 
+#include <array>
+#include <bit>
 #include <cstddef>
 #include <cstdint>
 #include <cstring>
@@ -44,24 +46,62 @@ namespace umpre {
 /// Tells quickly of most names that they are not in a set of names. It may be wrong the other way.
 class NameFilter {
 public:
-    NameFilter() : bits_(kWords) {}
+    NameFilter();
 
-    void add(std::string_view name) {
-        const std::uint32_t bit = hashOfName(name) % kBits;
-        bits_[bit / 64] |= std::uint64_t{1} << bit % 64;
-    }
+    void add(std::string_view name);
 
     /// Returns false only if the name was never added.
     [[nodiscard]] bool mayHold(std::string_view name) const noexcept {
-        const std::uint32_t bit = hashOfName(name) % kBits;
+        std::array<char, kChunk> bytes{};
+        return mayHoldAmongBytes(padded(name, bytes));
+    }
+
+    /// The same for a name from whose first eight bytes can be read.
+    [[nodiscard]] bool mayHoldAmongBytes(std::string_view name) const noexcept {
+        const std::uint32_t bit = hashOf(name) >> shift_;
         return (bits_[bit / 64] >> bit % 64 & 1U) != 0;
     }
 
 private:
-    static constexpr std::uint32_t kBits = 1U << 16U;
-    static constexpr std::size_t kWords = kBits / 64;
+    static constexpr std::size_t kChunk = sizeof(std::uint64_t);
+
+    // Returns the name, in a place from which eight bytes can be read.
+    [[nodiscard]] static std::string_view padded(std::string_view name,
+                                                 std::array<char, kChunk>& bytes) noexcept {
+        if (name.size() >= kChunk) {
+            return name;
+        }
+        return {bytes.data(), name.copy(bytes.data(), name.size())};
+    }
+
+    // Of the first eight bytes of a name, its last eight and its size.
+    [[nodiscard]] static std::uint32_t hashOf(std::string_view name) noexcept {
+        std::uint64_t first = 0;
+        std::uint64_t last = 0;
+        std::memcpy(&first, name.data(), kChunk);
+        const std::size_t behind = name.size() > kChunk ? name.size() - kChunk : 0;
+        std::memcpy(&last, name.data() + behind, kChunk);
+        const std::uint64_t mask = kFirstBytes[name.size() < kChunk ? name.size() : kChunk];
+        const std::uint64_t sum = (first & mask) + std::rotl(last & mask, 32) + name.size();
+        return static_cast<std::uint32_t>(sum * 0x9E3779B97F4A7C15U >> 32U);
+    }
+
+    void grow();
+
+    // The masks of the first bytes in memory of a chunk.
+    static constexpr std::array<std::uint64_t, 9> kFirstBytes = [] {
+        std::array<std::uint64_t, 9> masks{};
+        for (unsigned count = 1; count <= 8; ++count) {
+            masks[count] = std::endian::native == std::endian::little
+                               ? ~std::uint64_t{0} >> (64 - 8 * count)
+                               : ~std::uint64_t{0} << (64 - 8 * count);
+        }
+        return masks;
+    }();
 
     std::vector<std::uint64_t> bits_;
+    unsigned shift_;                     // a hash shifted by this is the place of its bit
+    std::vector<std::uint32_t> hashes_;  // of the names added
 };
 
 }  // namespace umpre

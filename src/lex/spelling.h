@@ -20,9 +20,23 @@ namespace umpre {
     return (lower >= 'a' && lower <= 'z') || byte == '_';
 }
 
+/// Tells whether a byte can go on in a name or a number.
+[[nodiscard]] constexpr bool isWordByte(char byte) noexcept {
+    return isNameStart(byte) || isDigit(byte);
+}
+
+[[nodiscard]] constexpr bool isBlankByte(char byte) noexcept {
+    return byte == ' ' || byte == '\t' || byte == '\v' || byte == '\f';
+}
+
+/// Tells whether a byte ends a line, or begins a line end of two bytes.
+[[nodiscard]] constexpr bool isLineEndByte(char byte) noexcept {
+    return byte == '\n' || byte == '\r';
+}
+
 /// Returns the end of a name that begins at `at`, or of the rest of one.
 [[nodiscard]] inline const char* nameEnd(const char* at) noexcept {
-    while (isNameStart(*at) || isDigit(*at)) {
+    while (isWordByte(*at)) {
         ++at;
     }
     return at;

@@ -1,206 +1,325 @@
 // SPDX-License-Identifier: MIT
 //
 // Most of a file is text that comes out as it went in. Of it the scanner would make tokens only for
-// the main loop to write them one after the other. This reader finds the bytes that could matter
-// and copies what stands between them in one piece:
+// the main loop to write them one after the other. This reader copies what stands between two marks
+// in one piece:
 //
-//     value = table[N] + 0x1f;   // N a macro
-//     -------------^             copied up to here; N is left to the scanner
+//     value = table[N] + 0x1f;   /* N a macro */
+//     --------------^                                 up to N, which is left to the expander
+//                    ------------^                    up to the comment, which is one blank
+//                                               ---   and on with the lines below
 //
-// Its results are equal because it splits the text where the scanner would: a name begins where no
-// name and no number goes on, and a literal ends at the first quote that no backslash escapes. What
-// it does not know (comments, continuations, carriage returns) it leaves to the scanner, at the
-// beginning of a token.
+// A run ends where something else than its bytes must be written; `run_` is where it began. As long
+// as the output is in step with the file, lines need no look at their beginnings. If a comment or a
+// continuation brought it out of step, lines are begun one by one until one has text, and its
+// marker.
 #include "lex/text_reader.h"
 
-#include <algorithm>
-#include <array>
 #include <cstddef>
-#include <cstdint>
-#include <string_view>
+#include <optional>
 
+#include "lex/comment.h"
 #include "lex/spelling.h"
+#include "lex/text_pass.h"
+#include "lex/text_scan.h"
 
 namespace umpre {
 namespace {
 
-enum class Class : std::uint8_t {
-    Plain,
-    Blank,
-    Name,
-    Digit,
-    Quote,
-    Slash,
-    Backslash,
-    LineFeed,
-    Return
-};
-
-constexpr std::array<Class, 256> kClasses = [] {
-    std::array<Class, 256> classes{};
-    const auto set = [&classes](std::string_view bytes, Class as) {
-        for (const char byte : bytes) {
-            classes[static_cast<unsigned char>(byte)] = as;
-        }
-    };
-    set("ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz_", Class::Name);
-    set("0123456789", Class::Digit);
-    set(" \t\v\f", Class::Blank);
-    set("\"'", Class::Quote);
-    set("/", Class::Slash);
-    set("\\", Class::Backslash);
-    set("\n", Class::LineFeed);
-    set("\r", Class::Return);
-    return classes;
-}();
-
-[[nodiscard]] Class classOf(char byte) noexcept {
-    return kClasses[static_cast<unsigned char>(byte)];
-}
-
-// The functions below read up to two bytes behind the text; zero bytes stand there.
-
-// Tells whether a comment or a continuation begins at `at`.
-[[nodiscard]] bool isSpecial(const char* at) noexcept {
-    if (*at == '/') {
-        return at[1] == '/' || at[1] == '*';
-    }
-    return *at == '\\' && (at[1] == '\n' || at[1] == '\r');
-}
-
-[[nodiscard]] const char* blanksEnd(const char* at) noexcept {
-    while (classOf(*at) == Class::Blank) {
+[[nodiscard]] const char* blanksEnd(const char* at, const char* end) noexcept {
+    while (at < end && isBlankByte(*at)) {
         ++at;
     }
     return at;
 }
 
-// Passes over the rest of a line, up to and including its line feed, or up to a byte that it must
-// not pass. `mustStop` says of a name whether it is such.
-template <typename MustStop>
-[[nodiscard]] const char* passLine(CppFileScanner& file, const char* at, const char* end,
-                                   MustStop mustStop) {
-    while (at < end) {
-        switch (classOf(*at)) {
-        case Class::Plain:
-        case Class::Blank: ++at; break;
-        case Class::Name: {
-            const char* const next = nameEnd(at);
-            if (mustStop(std::string_view(at, static_cast<std::size_t>(next - at)))) {
-                return at;
-            }
-            at = next;
-            break;
-        }
-        case Class::Digit: at += numberAt(at).text.size(); break;
-        case Class::Quote: at += std::max<std::size_t>(file.literalSize(at), 1); break;
-        case Class::Slash:
-        case Class::Backslash:
-            if (isSpecial(at)) {
-                return at;
-            }
-            ++at;
-            break;
-        case Class::LineFeed: return at + 1;
-        case Class::Return: return at;
-        }
-    }
-    return at;
-}
-
-// Tells whether what was passed, from `begin` to `at`, reached the line's end.
-[[nodiscard]] bool endsLine(const char* begin, const char* at) noexcept {
-    return at != begin && at[-1] == '\n';
-}
-
-// Tells whether a line can be read here whose first token stands at `first`.
-[[nodiscard]] bool isOrdinary(const char* first, const char* end) noexcept {
-    return first < end && *first != '#' && *first != '\r' && !isSpecial(first);
-}
-
-[[nodiscard]] std::size_t distance(const char* from, const char* to) noexcept {
-    return static_cast<std::size_t>(to - from);
+[[nodiscard]] bool beginsComment(const char* at, const char* end) noexcept {
+    return end - at > 1 && *at == '/' && (at[1] == '*' || at[1] == '/');
 }
 
 }  // namespace
 
+// One pass over the bytes ahead.
+class TextReader::Pass {
+public:
+    Pass(TextReader& reader, CppFileScanner& file, Stop from)
+        : reader_(reader),
+          output_(reader.output_),
+          file_(file),
+          pass_(file, from == Stop::LineStart, &reader.macroNames_),
+          run_(pass_.begin()) {}
+
+    [[nodiscard]] Stop copy(Stop from);
+
+    [[nodiscard]] bool isUsedUp() const noexcept { return pass_.begin() == pass_.end(); }
+
+private:
+    // Where copying stops; nothing if it goes on.
+    using Outcome = std::optional<Stop>;
+
+    // What a line begins with.
+    struct Beginning {
+        const char* first = nullptr;  // behind blanks and comments; null: for the scanner to read
+        std::size_t commentLines = 0;
+        bool hasComments = false;
+    };
+
+    [[nodiscard]] Outcome passMark(TextMark mark);
+    [[nodiscard]] Outcome passName();
+    [[nodiscard]] Outcome passComment();
+    [[nodiscard]] Outcome passContinuation();
+    [[nodiscard]] Outcome passCarriageReturn();
+
+    [[nodiscard]] Outcome beginLine(const char* start);
+    [[nodiscard]] Beginning beginningOf(const char* start);
+    void beginText(const char* start, const Beginning& beginning);
+    [[nodiscard]] const char* endBlankLine(const char* start, const Beginning& beginning);
+    [[nodiscard]] const char* endLine(const char* lineEnd);
+    void passCommentLines(std::size_t count);
+
+    [[nodiscard]] Stop stop(const char* place, Stop stop);
+    void writeUpTo(const char* place);
+
+    void commit(const char* place) { output_.countLines(pass_.commit(place)); }
+
+    void setInStep(bool isInStep) noexcept;
+
+    TextReader& reader_;
+    OutputWriter& output_;
+    CppFileScanner& file_;
+    TextPass pass_;
+    const char* run_;  // what is not written yet begins here
+    bool inStep_ = true;
+};
+
+TextReader::Stop TextReader::Pass::copy(Stop from) {
+    setInStep(output_.isAt(file_.position()));
+    Outcome outcome;
+    if (from == Stop::LineStart && !inStep_) {
+        outcome = beginLine(pass_.begin());
+    }
+    while (!outcome) {
+        outcome = passMark(pass_.scan().next());
+    }
+    return *outcome;
+}
+
+TextReader::Pass::Outcome TextReader::Pass::passMark(TextMark mark) {
+    const char* const at = pass_.at();
+    switch (mark) {
+    case TextMark::Name: return passName();
+    case TextMark::Comment: return passComment();
+    case TextMark::Continuation: return passContinuation();
+    case TextMark::CarriageReturn: return passCarriageReturn();
+    case TextMark::Literal: return stop(at, Stop::InLine);
+    case TextMark::LineFeed: return beginLine(endLine(at));
+    case TextMark::BlankLine:
+        writeUpTo(pass_.scan().lineStart(at));
+        run_ = at;
+        pass_.scan().resume(at, false);
+        return std::nullopt;
+    case TextMark::Hash:
+        writeUpTo(pass_.scan().lineStart(at));
+        commit(at);
+        return Stop::LineStart;
+    case TextMark::End: break;
+    }
+    // Blanks at the beginning of a line are not written before it shows what follows them.
+    const char* const start = pass_.scan().lineStart(at);
+    return start != nullptr ? stop(start, Stop::LineStart) : stop(at, Stop::InLine);
+}
+
+TextReader::Pass::Outcome TextReader::Pass::passName() {
+    const char* const at = pass_.at();
+    const char* const end = pass_.scan().nameEnd();
+    const std::string_view name(at, static_cast<std::size_t>(end - at));
+    if (name == "defined") {
+        pass_.scan().resume(end, false);  // no macro, even if there is one of this name
+        return std::nullopt;
+    }
+    writeUpTo(at);
+    commit(end);
+    reader_.name_ = name;
+    return Stop::Name;
+}
+
+TextReader::Pass::Outcome TextReader::Pass::passComment() {
+    const char* const at = pass_.at();
+    if (const char* const start = pass_.scan().lineStart(at); start != nullptr) {
+        return beginLine(start);
+    }
+    const CommentScan comment = scanComment(at, pass_.end());
+    if (comment.stop != CommentScan::Stop::Closed) {
+        return stop(at, Stop::InLine);
+    }
+    writeUpTo(at);
+    passCommentLines(comment.lineFeeds);
+    output_.write(" ");
+    run_ = comment.at;
+    pass_.scan().resume(comment.at, false);
+    return std::nullopt;
+}
+
+// A continuation is copied, but counts as a line of the file alone. At the beginning of a line it
+// is a blank, which may not come out.
+TextReader::Pass::Outcome TextReader::Pass::passContinuation() {
+    if (const char* const start = pass_.scan().lineStart(pass_.at()); start != nullptr) {
+        return stop(start, Stop::LineStart);
+    }
+    pass_.passContinuation(false);
+    setInStep(false);
+    return std::nullopt;
+}
+
+TextReader::Pass::Outcome TextReader::Pass::passCarriageReturn() {
+    const char* const at = pass_.at();
+    const char* const start = pass_.scan().lineStart(at);
+    if (start != nullptr) {
+        writeUpTo(start);
+        run_ = at;
+    }
+    const char* const behind = endLine(at);
+    if (!inStep_) {
+        return beginLine(behind);
+    }
+    pass_.scan().resume(behind, true);
+    return std::nullopt;
+}
+
+// Begins lines until one has text, or is one that needs no look at its beginning.
+TextReader::Pass::Outcome TextReader::Pass::beginLine(const char* start) {
+    for (;;) {
+        const Beginning beginning = beginningOf(start);
+        const char* const first = beginning.first;
+        if (first == nullptr || first == pass_.end()) {
+            return stop(start, Stop::LineStart);
+        }
+        if (*first == '#' && first[1] != '#') {
+            writeUpTo(start);
+            passCommentLines(beginning.commentLines);
+            commit(first);
+            return Stop::LineStart;
+        }
+        if (!isLineEndByte(*first)) {
+            beginText(start, beginning);
+            return std::nullopt;
+        }
+        start = endBlankLine(start, beginning);
+        if (inStep_ && !beginsComment(blanksEnd(start, pass_.end()), pass_.end())) {
+            pass_.scan().resume(start, true);
+            return std::nullopt;
+        }
+    }
+}
+
+// Looks at what a line begins with. Nothing is done yet about the comments there.
+TextReader::Pass::Beginning TextReader::Pass::beginningOf(const char* start) {
+    const char* const end = pass_.end();
+    Beginning beginning;
+    std::string& blanks = reader_.blanks_;
+    blanks.clear();
+    const char* at = start;
+    for (;;) {
+        const char* const next = blanksEnd(at, end);
+        if (!beginsComment(next, end)) {
+            if (beginning.hasComments) {
+                blanks.append(at, next);
+            }
+            const bool isContinuation = next < end && *next == '\\' && isLineEndByte(next[1]);
+            beginning.first = isContinuation ? nullptr : next;
+            return beginning;
+        }
+        const CommentScan comment = scanComment(next, end);
+        if (comment.stop != CommentScan::Stop::Closed) {
+            return {};
+        }
+        blanks.append(at, next).push_back(' ');
+        beginning.hasComments = true;
+        beginning.commentLines += comment.lineFeeds;
+        at = comment.at;
+    }
+}
+
+void TextReader::Pass::beginText(const char* start, const Beginning& beginning) {
+    writeUpTo(start);
+    passCommentLines(beginning.commentLines);
+    if (!inStep_) {
+        commit(beginning.first);
+        output_.syncTo(file_.position());
+        setInStep(true);
+    }
+    if (beginning.hasComments) {
+        output_.write(reader_.blanks_);
+        run_ = beginning.first;
+    }
+    pass_.scan().resume(beginning.first, false);
+}
+
+// Returns where the next line begins.
+const char* TextReader::Pass::endBlankLine(const char* start, const Beginning& beginning) {
+    if (beginning.first != start) {
+        writeUpTo(start);
+        run_ = beginning.first;
+    }
+    passCommentLines(beginning.commentLines);
+    return endLine(beginning.first);
+}
+
+// Passes over a line end, which comes out as one line feed. Returns where the next line begins.
+const char* TextReader::Pass::endLine(const char* lineEnd) {
+    output_.countLines(1);
+    pass_.countLines(1);
+    if (*lineEnd == '\n') {
+        return lineEnd + 1;
+    }
+    writeUpTo(lineEnd);
+    if (lineEnd[1] == '\n') {
+        run_ = lineEnd + 1;
+        return lineEnd + 2;
+    }
+    output_.write("\n");
+    run_ = lineEnd + 1;
+    return run_;
+}
+
+void TextReader::Pass::passCommentLines(std::size_t count) {
+    if (count > 0) {
+        output_.writeLineFeeds(count);
+        pass_.countLines(count);
+        setInStep(false);
+    }
+}
+
+TextReader::Stop TextReader::Pass::stop(const char* place, Stop stop) {
+    writeUpTo(place);
+    commit(place);
+    return stop;
+}
+
+void TextReader::Pass::writeUpTo(const char* place) {
+    if (place > run_) {
+        output_.write({run_, static_cast<std::size_t>(place - run_)});
+        run_ = place;
+    }
+}
+
+void TextReader::Pass::setInStep(bool isInStep) noexcept {
+    inStep_ = isInStep;
+    pass_.scan().markLineFeeds(!isInStep);
+}
+
 TextReader::Stop TextReader::copyText(CppFileScanner& file, Stop from) {
     Stop stop = from;
-    while (copyLines(file, stop) && !output_.failed()) {
+    bool goesOn = true;
+    while (goesOn && !output_.failed()) {
+        Pass pass(*this, file, stop);
+        if (pass.isUsedUp()) {
+            return stop;  // there are no bytes ahead
+        }
+        stop = pass.copy(stop);
+        goesOn = stop != Stop::Name && pass.isUsedUp();
     }
     return stop;
-}
-
-// Copies from the lines in memory, from where the last reading stopped. Returns true if they are
-// used up, so that more may follow.
-bool TextReader::copyLines(CppFileScanner& file, Stop& stop) {
-    const std::string_view text = file.wholeLines();
-    const char* const end = text.data() + text.size();
-    const char* at = text.data();
-    const char* run = at;  // what is not written yet begins here
-    std::size_t lines = 0;
-    // Lines leave the two in step as they are; if they are not, the next line wants a marker.
-    const bool inStep = output_.isAt(file.position());
-    while (at < end) {
-        if (stop == Stop::LineStart) {
-            const char* const first = blanksEnd(at);
-            if (!inStep || !isOrdinary(first, end)) {
-                break;
-            }
-            if (*first == '\n') {
-                // Blanks alone on a line are dropped.
-                output_.write({run, distance(run, at)});
-                run = at = first;
-            }
-        }
-        const char* const begin = at;
-        at = passLine(file, begin, end,
-                      [this](std::string_view name) { return macroNames_.mayHold(name); });
-        stop = endsLine(begin, at) ? Stop::LineStart : Stop::InLine;
-        if (stop == Stop::InLine) {
-            break;
-        }
-        ++lines;
-    }
-    output_.write({run, distance(run, at)});
-    output_.countLines(lines);
-    return leave(file, text, at, lines, stop);
-}
-
-TextReader::Stop TextReader::skipText(CppFileScanner& file) {
-    Stop stop = Stop::LineStart;
-    while (skipLines(file, stop) && !output_.failed()) {
-    }
-    return stop;
-}
-
-// Passes over the lines in memory; returns as above.
-bool TextReader::skipLines(CppFileScanner& file, Stop& stop) {
-    const std::string_view text = file.wholeLines();
-    const char* const end = text.data() + text.size();
-    const char* at = text.data();
-    std::size_t lines = 0;
-    while (at < end && isOrdinary(blanksEnd(at), end)) {
-        const char* const begin = at;
-        at = passLine(file, begin, end, [](std::string_view) { return false; });
-        stop = endsLine(begin, at) ? Stop::LineStart : Stop::InLine;
-        if (stop == Stop::InLine) {
-            break;
-        }
-        ++lines;
-    }
-    output_.endLines(lines);
-    return leave(file, text, at, lines, stop);
-}
-
-// Tells the file how far its text was read, to `at`. Returns whether that was all of it.
-bool TextReader::leave(CppFileScanner& file, std::string_view text, const char* at,
-                       std::size_t lines, Stop stop) {
-    const std::size_t used = distance(text.data(), at);
-    if (used > 0) {
-        file.advance(used, lines, stop == Stop::LineStart);
-    }
-    return used > 0 && used == text.size() && stop == Stop::LineStart;
 }
 
 }  // namespace umpre

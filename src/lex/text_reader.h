@@ -2,23 +2,25 @@
 #ifndef UMPRE_LEX_TEXT_READER_H
 #define UMPRE_LEX_TEXT_READER_H
 
-#include <cstddef>
+#include <string>
 #include <string_view>
 
 #include "lex/cpp_file_scanner.h"
 #include "lex/name_filter.h"
 #include "lex/output_writer.h"
+#include "lex/token.h"
 
 namespace umpre {
 
-/// The byte-level road through a file: passes over what the scanner would only copy or drop, and
-/// stops in front of everything else, at the beginning of a token.
+/// The byte-level road through a file's text: copies what the scanner would only have copied, and
+/// stops at everything else, at the beginning of a token.
 class TextReader {
 public:
     /// Where reading stopped.
     enum class Stop {
-        LineStart,  ///< before a line's first token, its blanks included
+        LineStart,  ///< before a line's first token, its blanks included, or at the end
         InLine,     ///< within a line that has been begun
+        Name,       ///< behind a name that may be a macro, which was not copied
     };
 
     TextReader(OutputWriter& output, const NameFilter& macroNames) noexcept
@@ -26,19 +28,18 @@ public:
 
     /// Copies text from the file to the output, from a line's start or from within a line, up to a
     /// name that may be a macro, a directive, or anything else out of the ordinary.
-    Stop copyText(CppFileScanner& file, Stop from);
+    [[nodiscard]] Stop copyText(CppFileScanner& file, Stop from);
 
-    /// Passes over skipped lines, from a line's start, and writes a line feed for each.
-    Stop skipText(CppFileScanner& file);
+    /// Returns the name behind which copying stopped, until the file is read on.
+    [[nodiscard]] Token name() const noexcept { return {TokenKind::IDENTIFIER, name_}; }
 
 private:
-    [[nodiscard]] bool copyLines(CppFileScanner& file, Stop& stop);
-    [[nodiscard]] bool skipLines(CppFileScanner& file, Stop& stop);
-    [[nodiscard]] static bool leave(CppFileScanner& file, std::string_view text, const char* at,
-                                    std::size_t lines, Stop stop);
+    class Pass;
 
     OutputWriter& output_;
     const NameFilter& macroNames_;
+    std::string_view name_;
+    std::string blanks_;  // of a line that begins with comments
 };
 
 }  // namespace umpre

@@ -4,7 +4,9 @@
 // of its input at a time. Whichever road it takes, the same must come out.
 #include <array>
 #include <cstddef>
+#include <cstdint>
 #include <ostream>
+#include <random>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -254,6 +256,59 @@ TEST(Roads, AgreeOnSkippedGroups) {
         "#if 0\n#",
         "#if 0\n\n\n\n#else N\nN\n#endif N\nN\n",
         "#if 0\n#ifdef\n#ifndef N\n#else\n#else\n#endif\n#endif\n#endif\nN\n",
+    });
+}
+
+// Texts of up to 40 of the bytes and words that can matter, in any order.
+[[nodiscard]] std::string randomText(std::mt19937& random) {
+    constexpr auto kParts = std::to_array<std::string_view>(
+        {"N",    "F",      "(",    ")",   " ",          " ",     "\t",
+         "\n",   "\n",     "\n",   "\r",  "\r\n",       "/*",    "*/",
+         "//",   "/",      "*",    "\"",  "\"",         "'",     "\\",
+         "\\\n", "\\\r\n", "#",    "##",  "1",          "0x1",   "8u",
+         "e5",   "NN",     "\xE9", "|",   "=",          "<",     "if 0",
+         "else", "N\n#",   "\n ",  "\n#", "some_words", "endif", "a_longer_name_than_most"});
+    std::string text;
+    for (std::size_t count = random() % 40; count > 0; --count) {
+        text += kParts[random() % kParts.size()];
+    }
+    return text;
+}
+
+TEST(Roads, AgreeOnTextsMadeAtRandom) {
+    constexpr std::uint_fast32_t kSeed = 3;
+    std::mt19937 random(kSeed);
+    for (int count = 0; count < 150; ++count) {
+        const std::string text = randomText(random);
+        expectSameOnAllRoads(std::string(kMacros).append(text));
+        expectSameOnAllRoads(std::string("#if 0\n").append(text).append("\n#endif\nN"));
+    }
+}
+
+TEST(Roads, AgreeOnLinesThatAreLongerThanAWindow) {
+    std::string words;
+    std::string numbers;
+    for (int number = 0; number < 40; ++number) {
+        words += "word N ";
+        numbers += "1,0x1f,";
+    }
+    const std::string blanks(100, ' ');
+    expectSameOnAllRoads({
+        words + "\nN\n",
+        numbers + "N\nN\n",
+        "\"" + words + "\" N\n",
+        "\"" + words + " N\n" + words,
+        "/* " + words + " */ N\nN\n",
+        "// " + words + "\nN\n",
+        "N // " + words + "\r\nN\n",
+        std::string(100, 'N') + " N\n" + std::string(100, '1') + "N\n",
+        blanks + "N\n" + blanks + "\n" + blanks + "#define M\nM\n",
+        "#define M " + words + "\nM\n",
+        "F(" + words + ")\n",
+        words + "/*\n" + words + "*/ \\\n" + words + "N\nN\n",
+        std::string(200, '/') + "\n" + std::string(101, '<') + "\n" + std::string(201, '\\')
+            + "\nN\n",
+        "it's " + words + "isn't" + words + "\nN\n",
     });
 }
 

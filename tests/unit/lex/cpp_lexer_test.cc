@@ -80,7 +80,7 @@ struct Scan {
         return readToEnd(lexer, comments);
     }
     const testing::MemoryFile file(text);
-    InputBuffer input(road.windowSize);
+    InputBuffer input({road.plain, road.windowSize});
     input.openBorrowed(file.descriptor());
     lexer.read(input);
     return readToEnd(lexer, comments);
@@ -446,7 +446,7 @@ TEST(CppLexer, ManyUnclosedQuotesOnALongLineAreReadInOnePass) {
 // The tests below use one scanner step by step.
 struct CppLexerSteps : ::testing::Test {
     void read(std::string_view text, std::size_t windowSize) {
-        input.emplace(windowSize);
+        input.emplace(RunOptions{.windowSize = windowSize});
         input->openText(text);
         lexer.read(*input);
     }
@@ -551,7 +551,7 @@ TEST_F(CppLexerSteps, BytesThatAreAdvancedOverAreNotScanned) {
 
 TEST_F(CppLexerSteps, LinesAndTokensMayTakeTurnsThroughAllWindows) {
     const testing::Pipe pipe("a 1\nbb 22\nccc 333\n");
-    input.emplace(2);
+    input.emplace(RunOptions{.windowSize = 8});
     input->openBorrowed(pipe.readEnd());
     lexer.read(*input);
     std::string names;
@@ -564,17 +564,45 @@ TEST_F(CppLexerSteps, LinesAndTokensMayTakeTurnsThroughAllWindows) {
     EXPECT_EQ(lexer.line(), 4);
 }
 
-TEST_F(CppLexerSteps, TheSizeOfALiteralAheadIsKnown) {
-    read("\"a\" 'bc' \"d 'e\n", 64);
-    const std::string_view ahead = lexer.wholeLines();
-    EXPECT_EQ(lexer.literalSize(ahead.data()), 3U);
-    EXPECT_EQ(lexer.literalSize(ahead.data() + 4), 4U);
-    EXPECT_EQ(lexer.literalSize(ahead.data() + 9), 0U);
-    EXPECT_EQ(lexer.literalSize(ahead.data() + 12), 0U);
+TEST_F(CppLexerSteps, ALineThatIsLongerThanTheWindowLiesAheadInParts) {
+    const testing::Pipe pipe("aaa bbb ccc ddd\n");
+    input.emplace(RunOptions{.windowSize = 6});
+    input->openBorrowed(pipe.readEnd());
+    lexer.read(*input);
+    EXPECT_EQ(lexer.wholeLines(), "");
+    std::string text;
+    for (std::string_view ahead = lexer.bytesAhead(); !ahead.empty(); ahead = lexer.bytesAhead()) {
+        EXPECT_TRUE(ahead.ends_with('\n') || lexer.wholeLines().empty());
+        text += ahead;
+        lexer.advance(ahead.size(), ahead.ends_with('\n') ? 1 : 0);
+    }
+    EXPECT_EQ(text, "aaa bbb ccc ddd\n");
+}
+
+TEST_F(CppLexerSteps, ALiteralMayReachAcrossTheBytesAhead) {
+    const testing::Pipe pipe("a \"b c d e f g\" h");
+    input.emplace(RunOptions{.windowSize = 4});
+    input->openBorrowed(pipe.readEnd());
+    lexer.read(*input);
+    EXPECT_EQ(lexer.lex().text, "a");
+    EXPECT_EQ(lexer.lex().text, " ");
+    EXPECT_EQ(lexer.lex().text, "\"b c d e f g\"");
+    EXPECT_EQ(lexer.lex().text, " ");
+    EXPECT_EQ(lexer.bytesAhead(), "h");
+}
+
+TEST_F(CppLexerSteps, ALineCommentMayReachAcrossTheBytesAhead) {
+    const testing::Pipe pipe("// b c d e f g\r\nh");
+    input.emplace(RunOptions{.windowSize = 4});
+    input->openBorrowed(pipe.readEnd());
+    lexer.read(*input);
+    EXPECT_EQ(lexer.lex().text, " ");
+    EXPECT_EQ(lexer.lex().kind, NEWLINE);
+    EXPECT_EQ(lexer.lex().text, "h");
 }
 
 TEST_F(CppLexerSteps, AnInputThatCannotBeReadThrows) {
-    input.emplace(8);
+    input.emplace(RunOptions{.windowSize = 8});
     input->openBorrowed(-1);
     lexer.read(*input);
     EXPECT_THROW((void)lexer.lex(), ScannerFailure);

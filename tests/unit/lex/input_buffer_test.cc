@@ -3,6 +3,7 @@
 
 #include <array>
 #include <cstddef>
+#include <cstring>
 #include <fcntl.h>
 #include <fstream>
 #include <string>
@@ -13,6 +14,7 @@
 #include <gtest/gtest.h>
 
 #include "lex/scanner_failure.h"
+#include "lex/spelling.h"
 #include "support/descriptors.h"
 #include "support/temporary_directory.h"
 
@@ -40,16 +42,19 @@ constexpr auto kTexts = std::to_array<std::string_view>({
     "a long line\nb\n\na much longer line\n",
 });
 
-// Returns what the windows hold, one text for each, having checked that two zero bytes follow.
+// Returns what the windows hold, one text for each, having checked what stands around it.
 [[nodiscard]] std::vector<std::string> windowsOf(InputBuffer& input) {
     std::vector<std::string> windows;
     char* position = input.begin();
-    while (input.refill(position, Need::Line)) {
+    while (input.refill(position, Need::Tokens)) {
         EXPECT_EQ(position, input.begin());
         EXPECT_EQ(input.end()[0], '\0');
         EXPECT_EQ(input.end()[1], '\0');
-        windows.emplace_back(position, input.lineLimit());
-        position = input.lineLimit();
+        std::array<char, 16> around{};
+        std::memcpy(around.data(), input.begin() - 8, 8);
+        std::memcpy(around.data() + 8, input.end(), 8);
+        windows.emplace_back(position, input.limit());
+        position = input.limit();
     }
     return windows;
 }
@@ -69,7 +74,7 @@ TEST(InputBuffer, GivesAllBytesOfAFile) {
         for (const std::size_t windowSize : kWindowSizes) {
             SCOPED_TRACE(::testing::Message()
                          << ::testing::PrintToString(text) << ", window " << windowSize);
-            InputBuffer input(windowSize);
+            InputBuffer input({.windowSize = windowSize});
             ASSERT_TRUE(input.openFile(name));
             EXPECT_EQ(joined(windowsOf(input)), text);
         }
@@ -82,7 +87,7 @@ TEST(InputBuffer, GivesAllBytesOfADescriptor) {
             SCOPED_TRACE(::testing::Message()
                          << ::testing::PrintToString(text) << ", window " << windowSize);
             const Pipe pipe(text);
-            InputBuffer input(windowSize);
+            InputBuffer input({.windowSize = windowSize});
             input.openBorrowed(pipe.readEnd());
             EXPECT_EQ(joined(windowsOf(input)), text);
         }
@@ -92,7 +97,7 @@ TEST(InputBuffer, GivesAllBytesOfADescriptor) {
 TEST(InputBuffer, GivesAllBytesOfAText) {
     for (const std::string_view text : kTexts) {
         SCOPED_TRACE(::testing::PrintToString(text));
-        InputBuffer input(4);
+        InputBuffer input({.windowSize = 4});
         input.openText(text);
         EXPECT_EQ(joined(windowsOf(input)), text);
     }
@@ -100,18 +105,18 @@ TEST(InputBuffer, GivesAllBytesOfAText) {
 
 TEST(InputBuffer, CopiesATextThatItIsGiven) {
     std::string text = "one\n";
-    InputBuffer input(16);
+    InputBuffer input({.windowSize = 16});
     input.openText(text);
     text = "two\n";
     EXPECT_EQ(joined(windowsOf(input)), "one\n");
 }
 
-TEST(InputBuffer, EveryWindowButTheLastEndsWithALineFeed) {
+TEST(InputBuffer, EveryWindowButTheLastEndsWithALineFeedIfLinesAreShort) {
     const TemporaryDirectory directory;
     const std::string name = directory.write("file", "a\nbb\nccc\ndddd\neeeee\nffffff");
-    for (const std::size_t windowSize : kWindowSizes) {
+    for (const std::size_t windowSize : {std::size_t{16}, std::size_t{65'536}}) {
         SCOPED_TRACE(windowSize);
-        InputBuffer input(windowSize);
+        InputBuffer input({.windowSize = windowSize});
         ASSERT_TRUE(input.openFile(name));
         const std::vector<std::string> windows = windowsOf(input);
         ASSERT_FALSE(windows.empty());
@@ -122,19 +127,91 @@ TEST(InputBuffer, EveryWindowButTheLastEndsWithALineFeed) {
     }
 }
 
-TEST(InputBuffer, HoldsALineHoweverLongItIs) {
+TEST(InputBuffer, AWindowEndsWithinALongLineBetweenTokens) {
+    for (const std::string_view text : {
+             "aaa bbb ccc ddd eee fff ggg hhh",
+             "a,b,c,d,e,f,g,h,i,j,k,l,m,n,o,p",
+             "aaaaa==bbbbb!=ccccc<<ddddd##eeeee&&fffff||",
+             "aaa\rbbb\rccc\rddd\r\reee\r",
+             "1.5e3+0x1F+2.5e3+0x2F+3.5e3",
+         }) {
+        for (const std::size_t windowSize : {std::size_t{4}, std::size_t{5}, std::size_t{6}}) {
+            InputBuffer input({.windowSize = windowSize});
+            const Pipe pipe(text);
+            input.openBorrowed(pipe.readEnd());
+            const std::vector<std::string> windows = windowsOf(input);
+            EXPECT_EQ(joined(windows), text);
+            EXPECT_GE(windows.size(), 2U) << text;
+            for (std::size_t index = 0; index + 1 < windows.size(); ++index) {
+                const char before = windows[index].back();
+                const char behind = windows[index + 1].front();
+                EXPECT_FALSE(isWordByte(before) && isWordByte(behind)) << text;
+                EXPECT_EQ(std::string("=!<>#&|").find(before), std::string::npos) << text;
+            }
+        }
+    }
+}
+
+TEST(InputBuffer, KeepsPairsOfBytesTogether) {
+    for (const std::string_view pair : {"\r\n", "\\\n", "\\\r", "/*", "//", "##", "||", "&&",
+                                        "==", "!=", "<=", ">=", "<<", ">>", "ab", "0x", "_1"}) {
+        for (std::size_t before = 1; before < 8; ++before) {
+            const std::string text = std::string(before, '.') + std::string(pair) + "...";
+            InputBuffer input({.windowSize = 2});
+            const Pipe pipe(text);
+            input.openBorrowed(pipe.readEnd());
+            std::size_t end = 0;
+            for (const std::string& window : windowsOf(input)) {
+                end += window.size();
+                EXPECT_NE(end, before + 1) << ::testing::PrintToString(text);
+            }
+        }
+    }
+}
+
+TEST(InputBuffer, HoldsATokenHoweverLongItIs) {
     const TemporaryDirectory directory;
-    const std::string line = std::string(100'000, 'x') + "\n";
-    const std::string name = directory.write("file", "a\n" + line + "b\n");
-    InputBuffer input(4);
+    const std::string word(100'000, 'x');
+    const std::string name = directory.write("file", "a\n" + word + "\nb\n");
+    InputBuffer input({.windowSize = 4});
     ASSERT_TRUE(input.openFile(name));
     const std::vector<std::string> windows = windowsOf(input);
     bool isWhole = false;
     for (const std::string& window : windows) {
+        isWhole = isWhole || window.find(word) != std::string::npos;
+    }
+    EXPECT_TRUE(isWhole);
+    EXPECT_EQ(joined(windows), "a\n" + word + "\nb\n");
+}
+
+// One line of many words.
+[[nodiscard]] std::string longLine() {
+    std::string line;
+    while (line.size() < 100'000) {
+        line += "word ";
+    }
+    return line + "\n";
+}
+
+TEST(InputBuffer, HoldsALineHoweverLongItIsOnThePlainRoad) {
+    const TemporaryDirectory directory;
+    const std::string line = longLine();
+    InputBuffer input({.plainRoad = true, .windowSize = 4});
+    ASSERT_TRUE(input.openFile(directory.write("file", "a\n" + line + "b\n")));
+    bool isWhole = false;
+    for (const std::string& window : windowsOf(input)) {
         isWhole = isWhole || window.find(line) != std::string::npos;
     }
     EXPECT_TRUE(isWhole);
-    EXPECT_EQ(joined(windows), "a\n" + line + "b\n");
+}
+
+TEST(InputBuffer, KeepsWindowsSmallWhenALineIsLong) {
+    const TemporaryDirectory directory;
+    InputBuffer input({.windowSize = 1024});
+    ASSERT_TRUE(input.openFile(directory.write("file", longLine())));
+    for (const std::string& window : windowsOf(input)) {
+        EXPECT_LE(window.size(), 4096U);
+    }
 }
 
 TEST(InputBuffer, KeepsWindowsSmallWhenLinesAreShort) {
@@ -143,7 +220,7 @@ TEST(InputBuffer, KeepsWindowsSmallWhenLinesAreShort) {
     for (int line = 0; line < 10'000; ++line) {
         text += "line\n";
     }
-    InputBuffer input(1024);
+    InputBuffer input({.windowSize = 1024});
     ASSERT_TRUE(input.openFile(directory.write("file", text)));
     for (const std::string& window : windowsOf(input)) {
         EXPECT_LE(window.size(), 4096U);
@@ -154,8 +231,8 @@ TEST(InputBuffer, HasNothingInAnEmptyInput) {
     const TemporaryDirectory directory;
     const std::string name = directory.write("empty", "");
     const Pipe pipe("");
-    for (const Need need : {Need::Line, Need::Bytes}) {
-        InputBuffer input(8);
+    for (const Need need : {Need::Tokens, Need::Bytes}) {
+        InputBuffer input({.windowSize = 8});
         ASSERT_TRUE(input.openFile(name));
         char* position = input.begin();
         EXPECT_FALSE(input.refill(position, need));
@@ -170,45 +247,45 @@ TEST(InputBuffer, HasNothingInAnEmptyInput) {
 }
 
 TEST(InputBuffer, TheEndStaysTheEnd) {
-    InputBuffer input(8);
+    InputBuffer input({.windowSize = 8});
     input.openText("a\n");
     EXPECT_EQ(joined(windowsOf(input)), "a\n");
     char* position = input.end();
-    EXPECT_FALSE(input.refill(position, Need::Line));
+    EXPECT_FALSE(input.refill(position, Need::Tokens));
     EXPECT_FALSE(input.refill(position, Need::Bytes));
 }
 
 TEST(InputBuffer, WaitsForAWholeLine) {
     Pipe pipe;
     pipe.write("one\ntw");
-    InputBuffer input(1024);
+    InputBuffer input({.windowSize = 1024});
     input.openBorrowed(pipe.readEnd());
     char* position = input.begin();
-    ASSERT_TRUE(input.refill(position, Need::Line));
-    EXPECT_EQ(std::string(position, input.lineLimit()), "one\n");
+    ASSERT_TRUE(input.refill(position, Need::Tokens));
+    EXPECT_EQ(std::string(position, input.limit()), "one\n");
     EXPECT_EQ(std::string(position, input.end()), "one\ntw");
     pipe.write("o\n");
     pipe.closeWriteEnd();
-    position = input.lineLimit();
-    ASSERT_TRUE(input.refill(position, Need::Line));
-    EXPECT_EQ(std::string(position, input.lineLimit()), "two\n");
+    position = input.limit();
+    ASSERT_TRUE(input.refill(position, Need::Tokens));
+    EXPECT_EQ(std::string(position, input.limit()), "two\n");
 }
 
 TEST(InputBuffer, TakesWhatThereIsIfBytesAreEnough) {
     const Pipe pipe;
     pipe.write("tw");
-    InputBuffer input(1024);
+    InputBuffer input({.windowSize = 1024});
     input.openBorrowed(pipe.readEnd());
     char* position = input.begin();
     ASSERT_TRUE(input.refill(position, Need::Bytes));
     EXPECT_EQ(std::string(position, input.end()), "tw");
-    EXPECT_EQ(input.lineLimit(), input.begin());
+    EXPECT_EQ(input.limit(), input.begin());
 }
 
 TEST(InputBuffer, KeepsWhatStandsBehindThePosition) {
     const Pipe pipe;
     pipe.write("abcdef");
-    InputBuffer input(1024);
+    InputBuffer input({.windowSize = 1024});
     input.openBorrowed(pipe.readEnd());
     char* position = input.begin();
     ASSERT_TRUE(input.refill(position, Need::Bytes));
@@ -218,10 +295,33 @@ TEST(InputBuffer, KeepsWhatStandsBehindThePosition) {
     EXPECT_EQ(std::string(position, input.end()), "efghi");
 }
 
+TEST(InputBuffer, BringsAsMuchAgainAsIsKept) {
+    const Pipe pipe("abcdefghijkl");
+    InputBuffer input({.windowSize = 4});
+    input.openBorrowed(pipe.readEnd());
+    char* position = input.begin();
+    ASSERT_TRUE(input.refill(position, Need::Bytes));
+    ASSERT_EQ(std::string(position, input.end()), "abcd");
+    ASSERT_TRUE(input.refill(position, Need::Double));
+    EXPECT_GE(std::string(position, input.end()), "abcdefgh");
+}
+
+TEST(InputBuffer, FindsAnotherLimitInWhatIsLeft) {
+    const Pipe pipe;
+    pipe.write("aa\nbb\ncc");
+    InputBuffer input({.windowSize = 1024});
+    input.openBorrowed(pipe.readEnd());
+    char* position = input.begin();
+    ASSERT_TRUE(input.refill(position, Need::Bytes));
+    position += 1;
+    ASSERT_TRUE(input.refill(position, Need::Tokens));
+    EXPECT_EQ(std::string(position, input.limit()), "a\nbb\n");
+}
+
 TEST(InputBuffer, CannotOpenWhatIsNoFile) {
     const TemporaryDirectory directory;
     const std::string name = directory.write("file", "a\n");
-    InputBuffer input(8);
+    InputBuffer input({.windowSize = 8});
     EXPECT_FALSE(input.openFile(directory.nameOf("nothing")));
     EXPECT_FALSE(input.openFile(directory.name()));
     EXPECT_FALSE(input.openFile(name + "/below"));
@@ -231,7 +331,7 @@ TEST(InputBuffer, CannotOpenWhatIsNoFile) {
 TEST(InputBuffer, ANameWithAZeroByteOpensNothing) {
     const TemporaryDirectory directory;
     const std::string name = directory.write("file", "a\n");
-    InputBuffer input(8);
+    InputBuffer input({.windowSize = 8});
     EXPECT_FALSE(input.openFile(name + std::string("\0x", 2)));
     EXPECT_FALSE(input.openFile(name + std::string(1, '\0')));
 }
@@ -241,7 +341,7 @@ TEST(InputBuffer, AFileEndsWhereItEndedWhenItWasOpened) {
     const std::string name = directory.write("file", "one\ntwo\n");
     for (const std::size_t windowSize : kWindowSizes) {
         directory.write("file", "one\ntwo\n");
-        InputBuffer input(windowSize);
+        InputBuffer input({.windowSize = windowSize});
         ASSERT_TRUE(input.openFile(name));
         std::ofstream(name, std::ios::app) << "three\n";
         EXPECT_EQ(joined(windowsOf(input)), "one\ntwo\n") << windowSize;
@@ -251,7 +351,7 @@ TEST(InputBuffer, AFileEndsWhereItEndedWhenItWasOpened) {
 TEST(InputBuffer, AFileThatBecomesShorterEndsThere) {
     const TemporaryDirectory directory;
     const std::string name = directory.write("file", "one\ntwo\n");
-    InputBuffer input(64);
+    InputBuffer input({.windowSize = 64});
     ASSERT_TRUE(input.openFile(name));
     directory.write("file", "1\n");
     EXPECT_EQ(joined(windowsOf(input)), "1\n");
@@ -259,7 +359,7 @@ TEST(InputBuffer, AFileThatBecomesShorterEndsThere) {
 
 TEST(InputBuffer, ReadsFilesThatDoNotTellTheirSize) {
     const std::string name = "/proc/self/maps";
-    InputBuffer input(16);
+    InputBuffer input({.windowSize = 16});
     if (!input.openFile(name)) {
         GTEST_SKIP() << "there is no " << name;
     }
@@ -270,11 +370,11 @@ TEST(InputBuffer, ThrowsIfReadingFails) {
     const TemporaryDirectory directory;
     const int descriptor = ::open(directory.name().c_str(), O_RDONLY | O_CLOEXEC);
     ASSERT_GE(descriptor, 0);
-    InputBuffer input(8);
+    InputBuffer input({.windowSize = 8});
     input.openBorrowed(descriptor);
     char* position = input.begin();
     try {
-        (void)input.refill(position, Need::Line);
+        (void)input.refill(position, Need::Tokens);
         ADD_FAILURE() << "nothing was thrown";
     } catch (const ScannerFailure& failure) {
         EXPECT_STREQ(failure.message, "input in flex scanner failed");
@@ -286,10 +386,10 @@ TEST(InputBuffer, LeavesABorrowedDescriptorOpen) {
     const Pipe pipe;
     pipe.write("a\n");
     {
-        InputBuffer input(8);
+        InputBuffer input({.windowSize = 8});
         input.openBorrowed(pipe.readEnd());
         char* position = input.begin();
-        EXPECT_TRUE(input.refill(position, Need::Line));
+        EXPECT_TRUE(input.refill(position, Need::Tokens));
         input.close();
     }
     pipe.write("b\n");
@@ -299,7 +399,7 @@ TEST(InputBuffer, LeavesABorrowedDescriptorOpen) {
 TEST(InputBuffer, CanBeUsedAgain) {
     const TemporaryDirectory directory;
     const std::string name = directory.write("file", std::string(1000, 'x') + "\n");
-    InputBuffer input(8);
+    InputBuffer input({.windowSize = 8});
     for (int round = 0; round < 3; ++round) {
         ASSERT_TRUE(input.openFile(name));
         EXPECT_EQ(joined(windowsOf(input)).size(), 1001U);

@@ -56,6 +56,33 @@ TEST(NameFilter, StopsNearlyAllOtherNames) {
     EXPECT_LT(passed, 200);
 }
 
+TEST(NameFilter, StopsNearlyAllOtherNamesHoweverManyItHolds) {
+    NameFilter filter;
+    constexpr int kCount = 100'000;
+    for (int number = 0; number < kCount; ++number) {
+        filter.add("REGISTER_" + std::to_string(number) + "_A");
+    }
+    int passed = 0;
+    for (int number = 0; number < kCount; ++number) {
+        EXPECT_TRUE(filter.mayHold("REGISTER_" + std::to_string(number) + "_A"));
+        passed += filter.mayHold("REGISTER_" + std::to_string(number) + "_B") ? 1 : 0;
+    }
+    EXPECT_LT(passed, kCount / 8);
+}
+
+TEST(NameFilter, LooksAtTheBytesOfTheNameAlone) {
+    NameFilter filter;
+    for (const std::string name :
+         {"a", "seven_b", "eight_by", "nine_byte", "a_name_of_20_bytes__"}) {
+        filter.add(name);
+        for (const std::string around : {"xxxxxxxx", "yyyyyyyy"}) {
+            const std::string text = around + name + around;
+            EXPECT_TRUE(filter.mayHoldAmongBytes(std::string_view(text).substr(8, name.size())))
+                << name;
+        }
+    }
+}
+
 TEST(NameFilter, TellsTheEmptyNameFromAZeroByte) {
     EXPECT_NE(hashOfName(""), hashOfName("\0"sv));
     EXPECT_NE(hashOfName("\0"sv), hashOfName("\0\0"sv));

@@ -27,9 +27,11 @@ constexpr auto kWindowSizes = std::to_array<std::size_t>({1, 2, 3, 7, 64 * 1024}
 struct Reading {
     Reading(std::string_view text, std::size_t windowSize) : file(comments, {false, windowSize}) {
         isOpen = file.open(directory.write("main", text));
+        file.setFileName("main");
         output.redirect(sink);
         output.countLines(1);
         names.add("MACRO");
+        names.add("defined");
     }
 
     [[nodiscard]] const std::string& written() {
@@ -49,7 +51,7 @@ struct Reading {
     TextReader reader{output, names};
 };
 
-// What is read of a text, and the text of the token that is left next.
+// What is written of a text, and the name where that stopped, or the text of the token there.
 struct Row {
     std::string_view text;
     std::string_view written;
@@ -58,7 +60,7 @@ struct Row {
 
 void expectCopies(const std::vector<Row>& table, Stop stop) {
     for (const Row& row : table) {
-        for (const std::size_t windowSize : kWindowSizes) {
+        for (const std::size_t windowSize : {std::size_t{64}, std::size_t{65'536}}) {
             SCOPED_TRACE(::testing::Message()
                          << ::testing::PrintToString(row.text) << ", window " << windowSize);
             Reading reading(row.text, windowSize);
@@ -66,22 +68,11 @@ void expectCopies(const std::vector<Row>& table, Stop stop) {
             EXPECT_EQ(reading.reader.copyText(reading.file, Stop::LineStart), stop);
             EXPECT_EQ(reading.written(), row.written);
             EXPECT_TRUE(reading.isInStep());
-            EXPECT_EQ(reading.file.next().text, row.next);
-        }
-    }
-}
-
-void expectSkips(const std::vector<Row>& table, Stop stop) {
-    for (const Row& row : table) {
-        for (const std::size_t windowSize : kWindowSizes) {
-            SCOPED_TRACE(::testing::Message()
-                         << ::testing::PrintToString(row.text) << ", window " << windowSize);
-            Reading reading(row.text, windowSize);
-            ASSERT_TRUE(reading.isOpen);
-            EXPECT_EQ(reading.reader.skipText(reading.file), stop);
-            EXPECT_EQ(reading.written(), row.written);
-            EXPECT_TRUE(reading.isInStep());
-            EXPECT_EQ(reading.file.next().text, row.next);
+            if (stop == Stop::Name) {
+                EXPECT_EQ(reading.reader.name().text, row.next);
+            } else {
+                EXPECT_EQ(reading.file.next().text, row.next);
+            }
         }
     }
 }
@@ -103,31 +94,36 @@ TEST(TextReader, DropsTheBlanksOfLinesThatHoldNothingElse) {
     expectCopies({{"  \n\t\v\f\na\n \n", "\n\na\n\n", ""}}, Stop::LineStart);
 }
 
-TEST(TextReader, StopsBeforeADirective) {
-    expectCopies(
-        {
-            {"#x\n", "", "#"},
-            {"a\n#x\n", "a\n", "#"},
-            {"a\n #x\n", "a\n", " "},
-            {"a\n\n\t\t#x\n", "a\n\n", "\t"},
-        },
-        Stop::LineStart);
+TEST(TextReader, StopsAtADirective) {
+    for (const Row& row : {
+             Row{"#x\n", "", "#"},
+             Row{"a\n#x\n", "a\n", "#"},
+             Row{"a\n #x\n", "a\n", "#"},
+             Row{"a\n\n\t\t#x\n", "a\n\n", "#"},
+             Row{"a\n/**/#x\n", "a\n", "#"},
+             Row{"a\n /* b */ #x\n", "a\n", "#"},
+             Row{"a\n\r\n\r #x\n", "a\n\n\n", "#"},
+         }) {
+        Reading reading(row.text, 64);
+        EXPECT_EQ(reading.reader.copyText(reading.file, Stop::LineStart), Stop::LineStart);
+        EXPECT_EQ(reading.written(), row.written);
+        EXPECT_EQ(reading.file.next().text, row.next);
+    }
 }
 
-TEST(TextReader, StopsBeforeALineThatMayTurnOutToBeADirective) {
+TEST(TextReader, LeavesTheBlanksOfALineThatAContinuationBeginsToTheScanner) {
     expectCopies(
         {
-            {"a\n/**/#x\n", "a\n", " "},
-            {"a\n /**/ #x\n", "a\n", " "},
-            {"a\n// b\n", "a\n", " "},
             {"a\n\\\n#x\n", "a\n", "\\\n"},
             {"a\n \\\r\n#x\n", "a\n", " "},
-            {"a\n\r\nb\n", "a\n", "\n"},
         },
         Stop::LineStart);
+    Reading reading("/* */ \\\n#x\n", 64);
+    EXPECT_EQ(reading.reader.copyText(reading.file, Stop::LineStart), Stop::LineStart);
+    EXPECT_EQ(reading.file.next().text, " ");
 }
 
-TEST(TextReader, StopsBeforeANameThatMayBeAMacro) {
+TEST(TextReader, StopsAtANameThatMayBeAMacro) {
     expectCopies(
         {
             {"MACRO\n", "", "MACRO"},
@@ -139,10 +135,10 @@ TEST(TextReader, StopsBeforeANameThatMayBeAMacro) {
             {"\\MACRO\n", "\\", "MACRO"},
             {"\"\"MACRO\n", "\"\"", "MACRO"},
         },
-        Stop::InLine);
+        Stop::Name);
 }
 
-TEST(TextReader, StopsBeforeANameRightBehindANumber) {
+TEST(TextReader, StopsAtANameRightBehindANumber) {
     expectCopies(
         {
             {"1MACRO\n", "1", "MACRO"},
@@ -156,7 +152,7 @@ TEST(TextReader, StopsBeforeANameRightBehindANumber) {
             {"0xFuLMACRO\n", "0xFuL", "MACRO"},
             {"1.5MACRO\n", "1.5", "MACRO"},
         },
-        Stop::InLine);
+        Stop::Name);
 }
 
 TEST(TextReader, PassesNamesThatOnlyHoldOne) {
@@ -194,20 +190,25 @@ TEST(TextReader, PassesNamesInLiterals) {
     Stop stop = Stop::LineStart;
     for (;;) {
         stop = reading.reader.copyText(reading.file, stop);
+        if (stop == Stop::Name) {
+            reading.output.write("<" + std::string(reading.reader.name().text) + ">");
+            stop = Stop::InLine;
+            continue;
+        }
         const Token token = reading.file.next();
         if (token.kind == END_OF_INPUT) {
-            return reading.written();
+            return reading.written() + reading.comments.effects();
         }
         if (token.kind == NEWLINE) {
             reading.output.endLine();
         } else {
-            reading.output.write(token.text == "MACRO" ? "<MACRO>" : token.text);
+            reading.output.write(token.text);
         }
         stop = token.kind == NEWLINE ? Stop::LineStart : Stop::InLine;
     }
 }
 
-TEST(TextReader, LeavesEveryNameThatMayBeAMacroToTheScanner) {
+TEST(TextReader, LeavesEveryNameThatMayBeAMacro) {
     struct Copy {
         std::string_view text;
         std::string_view output;
@@ -222,6 +223,8 @@ TEST(TextReader, LeavesEveryNameThatMayBeAMacroToTheScanner) {
              Copy{"\"\\\\\\\"MACRO\n", "\"\\\\\\\"<MACRO>\n"},
              Copy{"a /* MACRO */ MACRO // MACRO\n", "a   <MACRO>  \n"},
              Copy{"MACRO\rMACRO\r\nMACRO", "<MACRO>\n<MACRO>\n<MACRO>\n"},
+             Copy{"MACRO \"MACRO\" \"MACRO\n", "<MACRO> \"MACRO\" \"<MACRO>\n"},
+             Copy{"defined MACRO\n", "defined <MACRO>\n"},
          }) {
         for (const std::size_t windowSize : kWindowSizes) {
             EXPECT_EQ(copyAll(copy.text, windowSize), copy.output)
@@ -230,17 +233,92 @@ TEST(TextReader, LeavesEveryNameThatMayBeAMacroToTheScanner) {
     }
 }
 
-TEST(TextReader, LeavesCommentsContinuationsAndCarriageReturnsToTheScanner) {
+// Whatever a text begins with, what matters may stand anywhere in the 64 bytes that are looked at.
+TEST(TextReader, FindsWhatMattersInAnyPlace) {
+    for (std::size_t size = 52; size < 68; ++size) {
+        const std::string words = std::string(size, 'x') + "-";
+        EXPECT_EQ(copyAll(words + "MACRO x\n", 1024), words + "<MACRO> x\n");
+        EXPECT_EQ(copyAll(words + "1xMACRO 08MACRO\n", 1024), words + "1xMACRO 08<MACRO>\n");
+        EXPECT_EQ(copyAll(words + "\"MACRO\" MACRO\n", 1024), words + "\"MACRO\" <MACRO>\n");
+        EXPECT_EQ(copyAll(words + "/*MACRO*/MACRO\n", 1024), words + " <MACRO>\n");
+        EXPECT_EQ(copyAll(words + "//MACRO\n \nMACRO\n", 1024), words + " \n\n<MACRO>\n");
+        EXPECT_EQ(copyAll(words + "\n  \r\nMACRO\n", 1024), words + "\n\n<MACRO>\n");
+    }
+}
+
+TEST(TextReader, FindsANameBehindALongNumber) {
+    for (std::size_t size : {1U, 55U, 56U, 57U, 58U, 59U, 60U, 61U, 62U, 63U, 64U, 65U, 130U}) {
+        const std::string digits(size, '1');
+        EXPECT_EQ(copyAll(digits + "MACRO", 1024), digits + "<MACRO>\n");
+        EXPECT_EQ(copyAll("0x" + digits + "MACRO", 1024), "0x" + digits + "<MACRO>\n");
+        EXPECT_EQ(copyAll("x" + digits + "MACRO", 1024), "x" + digits + "MACRO\n");
+    }
+}
+
+TEST(TextReader, MakesACommentWithinALineABlank) {
     expectCopies(
         {
-            {"a // b\n", "a ", " "},
-            {"a/* b */\n", "a", " "},
-            {"a \\\nb\n", "a ", "\\\n"},
-            {"a\\\r\nb\n", "a", "\\\r\n"},
-            {"a\rb\n", "a", "\n"},
-            {"a\r\n", "a", "\n"},
+            {"a/* b */c\n", "a c\n", ""},
+            {"a // b\nc\n", "a  \nc\n", ""},
+            {"a /* b *//**/ // c\n", "a     \n", ""},
+            {"a // b\r\nc\n", "a  \nc\n", ""},
         },
-        Stop::InLine);
+        Stop::LineStart);
+}
+
+TEST(TextReader, DropsTheCommentsOfLinesThatHoldNothingElse) {
+    for (const Row& row : {
+             Row{"/* a */\n// b\n  /* c */ // d\ne\n", "\n\n\ne\n", ""},
+             Row{"a\n\t/* b */\n\n// c\r\nd\n", "a\n\n\n\nd\n", ""},
+         }) {
+        EXPECT_EQ(copyAll(row.text, 1024), row.written) << row.text;
+    }
+}
+
+TEST(TextReader, WritesALineMarkerBeforeTheTextBehindACommentOfLines) {
+    for (const Row& row : {
+             Row{"/* a\n */\nb\nc\n", "\n\n#line 3 \"main\"\nb\nc\n", ""},
+             Row{"/* a\n */\n\n \n // c\n b\n", "\n\n\n\n\n#line 6 \"main\"\n b\n", ""},
+             Row{"a /* a\n */ b\nc\n", "a \n  b\n#line 3 \"main\"\nc\n", ""},
+             Row{"/* a\n */ b\nc\n", "\n#line 2 \"main\"\n  b\nc\n", ""},
+             Row{"\t/**/ /* a\n */\tb\n", "\n#line 2 \"main\"\n\t   \tb\n", ""},
+             Row{"a /* a\n */\n#b\n", "a \n \n", "#"},
+             Row{"a /* a\n */\n##b\n", "a \n \n#line 3 \"main\"\n##b\n", ""},
+             Row{"a \\\nb\nc\n", "a \\\nb\n#line 3 \"main\"\nc\n", ""},
+             Row{"a \\\r\nb\nc\n", "a \\\r\nb\n#line 3 \"main\"\nc\n", ""},
+             Row{"a\\\rb\r c\n", "a\\\rb\n#line 3 \"main\"\n c\n", ""},
+         }) {
+        Reading reading(row.text, 1024);
+        EXPECT_EQ(reading.reader.copyText(reading.file, Stop::LineStart), Stop::LineStart);
+        EXPECT_EQ(reading.written(), row.written) << ::testing::PrintToString(row.text);
+        EXPECT_EQ(reading.file.next().text, row.next);
+    }
+}
+
+TEST(TextReader, WritesALineFeedForACarriageReturn) {
+    expectCopies(
+        {
+            {"a\r\nb\r\n", "a\nb\n", ""},
+            {"a\rb\r\r", "a\nb\n\n", ""},
+            {" \r\n\t\r  \rb\n", "\n\n\nb\n", ""},
+            {"a \r\n \"\r\"\n", "a \n \"\r\"\n", ""},
+        },
+        Stop::LineStart);
+}
+
+TEST(TextReader, LeavesWhatTheWindowDoesNotHoldToTheScanner) {
+    Reading reading("a /* b c d e f */ g\n", 8);
+    EXPECT_EQ(reading.reader.copyText(reading.file, Stop::LineStart), Stop::InLine);
+    EXPECT_EQ(reading.written(), "a ");
+    EXPECT_EQ(reading.file.next().text, " ");
+    Reading other("a \"b c d e f\" g\n", 8);
+    EXPECT_EQ(other.reader.copyText(other.file, Stop::LineStart), Stop::InLine);
+    EXPECT_EQ(other.written(), "a ");
+    EXPECT_EQ(other.file.next().text, "\"b c d e f\"");
+}
+
+TEST(TextReader, TellsOfACommentThatIsNeverClosed) {
+    EXPECT_EQ(copyAll("a /* b\n c", 1024), "a  \n\n[2]");
 }
 
 TEST(TextReader, LeavesALastLineThatHasNoLineEndToBeClosed) {
@@ -252,58 +330,22 @@ TEST(TextReader, LeavesALastLineThatHasNoLineEndToBeClosed) {
 }
 
 TEST(TextReader, GoesOnWithinALine) {
-    for (const std::size_t windowSize : kWindowSizes) {
-        Reading reading("MACRO a #b\n c MACRO\n", windowSize);
-        ASSERT_TRUE(reading.isOpen);
-        EXPECT_EQ(reading.file.next().text, "MACRO");
-        EXPECT_EQ(reading.reader.copyText(reading.file, Stop::InLine), Stop::InLine);
-        EXPECT_EQ(reading.written(), " a #b\n c ");
-        EXPECT_EQ(reading.file.next().text, "MACRO");
-    }
+    Reading reading("MACRO a #b\n c MACRO\n", 64);
+    ASSERT_TRUE(reading.isOpen);
+    EXPECT_EQ(reading.file.next().text, "MACRO");
+    EXPECT_EQ(reading.reader.copyText(reading.file, Stop::InLine), Stop::Name);
+    EXPECT_EQ(reading.written(), " a #b\n c ");
+    EXPECT_EQ(reading.reader.name().text, "MACRO");
+    EXPECT_EQ(reading.file.next().kind, NEWLINE);
 }
 
 TEST(TextReader, CopiesNothingBehindATokenLookedAheadAt) {
     Reading reading("a b\n", 16);
     EXPECT_EQ(reading.file.peek(), IDENTIFIER);
-    (void)reading.reader.copyText(reading.file, Stop::LineStart);
+    EXPECT_EQ(reading.reader.copyText(reading.file, Stop::LineStart), Stop::LineStart);
+    EXPECT_EQ(reading.reader.copyText(reading.file, Stop::InLine), Stop::InLine);
     EXPECT_EQ(reading.written(), "");
     EXPECT_EQ(reading.file.next().text, "a");
-}
-
-TEST(TextReader, WritesALineFeedForEachLineSkipped) {
-    expectSkips(
-        {
-            {"", "", ""},
-            {"a\n\n  \nMACRO \"b\" 1\n", "\n\n\n\n", ""},
-            {"a # b\n", "\n", ""},
-            {"x\0y\n\xE9\n"sv, "\n\n", ""},
-        },
-        Stop::LineStart);
-}
-
-TEST(TextReader, StopsSkippingBeforeADirective) {
-    expectSkips(
-        {
-            {"#x\n", "", "#"},
-            {"a\n#x\n", "\n", "#"},
-            {"a\n  #x\n", "\n", " "},
-            {"a\n/**/#x\n", "\n", " "},
-            {"a\n\\\n#x\n", "\n", "\\\n"},
-            {"a\n\r\n#x\n", "\n", "\n"},
-        },
-        Stop::LineStart);
-}
-
-TEST(TextReader, StopsSkippingWithinALineThatMayGoOn) {
-    expectSkips(
-        {
-            {"a\nb /* c\n*/\n", "\n", " "},
-            {"a\nb // c\n", "\n", " "},
-            {"a\nb \\\n#c\n", "\n", "\\\n"},
-            {"a\nb\rc\n", "\n", "\n"},
-            {"a\nb", "\n", ""},
-        },
-        Stop::InLine);
 }
 
 }  // namespace

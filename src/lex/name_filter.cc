@@ -1,0 +1,36 @@
+// SPDX-License-Identifier: MIT
+#include "lex/name_filter.h"
+
+#include <algorithm>
+
+namespace umpre {
+namespace {
+
+constexpr unsigned kLeastBits = 16;  // as powers of two
+constexpr unsigned kMostBits = 21;   // what stays close to the processor
+constexpr std::size_t kBitsForEach = 16;
+
+}  // namespace
+
+NameFilter::NameFilter() : bits_((std::size_t{1} << kLeastBits) / 64), shift_(32 - kLeastBits) {}
+
+void NameFilter::add(std::string_view name) {
+    std::array<char, kChunk> bytes{};
+    hashes_.push_back(hashOf(padded(name, bytes)));
+    if (hashes_.size() * kBitsForEach > bits_.size() * 64 && shift_ > 32 - kMostBits) {
+        grow();
+    }
+    const std::uint32_t bit = hashes_.back() >> shift_;
+    bits_[bit / 64] |= std::uint64_t{1} << bit % 64;
+}
+
+void NameFilter::grow() {
+    --shift_;
+    bits_.assign(2 * bits_.size(), 0);
+    for (const std::uint32_t hash : hashes_) {
+        const std::uint32_t bit = hash >> shift_;
+        bits_[bit / 64] |= std::uint64_t{1} << bit % 64;
+    }
+}
+
+}  // namespace umpre

@@ -1,0 +1,59 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_LEX_TEXT_PASS_H
+#define UMPRE_LEX_TEXT_PASS_H
+
+#include <cstddef>
+#include <string_view>
+
+#include "lex/comment.h"
+#include "lex/cpp_file_scanner.h"
+#include "lex/name_filter.h"
+#include "lex/text_scan.h"
+
+namespace umpre {
+
+/// One pass over the bytes of a file that lie ahead: the scan of them, and what the file must be
+/// told about it.
+class TextPass {
+public:
+    /// `names` as for a `TextScan`. If there are no bytes ahead, there is nothing to pass.
+    TextPass(CppFileScanner& file, bool atLineStart, const NameFilter* names);
+
+    [[nodiscard]] TextScan& scan() noexcept { return scan_; }
+
+    /// Returns the place of the scan's mark.
+    [[nodiscard]] const char* at() const noexcept { return scan_.at(); }
+
+    [[nodiscard]] const char* end() const noexcept { return scan_.end(); }
+
+    /// Returns where the file stands.
+    [[nodiscard]] const char* begin() const noexcept { return begin_; }
+
+    /// Counts lines of the file that the scan did not see.
+    void countLines(std::size_t count) noexcept { lines_ += count; }
+
+    /// Passes over the continuation that the scan stopped at.
+    void passContinuation(bool atLineStart) noexcept;
+
+    /// Tells the file that it was read up to `place`, where a token begins. Returns the line feeds
+    /// that the scan passed since the last time.
+    std::size_t commit(const char* place);
+
+private:
+    TextPass(CppFileScanner& file, std::string_view text, bool atLineStart, const NameFilter* names)
+        : file_(file), scan_(text, atLineStart, file.literals(), names), begin_(text.data()) {}
+
+    CppFileScanner& file_;
+    TextScan scan_;
+    const char* begin_;
+    const char* continued_ = nullptr;  // behind the last continuation
+    std::size_t lines_ = 0;
+};
+
+/// Returns the comment that begins at `at`. It is cut if it is one for the scanner: one that the
+/// bytes up to `end` do not hold whole, or a line comment whose end they do not tell.
+[[nodiscard]] CommentScan scanComment(const char* at, const char* end) noexcept;
+
+}  // namespace umpre
+
+#endif

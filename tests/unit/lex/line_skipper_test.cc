@@ -1,0 +1,149 @@
+// SPDX-License-Identifier: MIT
+#include "lex/line_skipper.h"
+
+#include <array>
+#include <cstddef>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+#include "support/recording_comment_sink.h"
+#include "support/recording_sink.h"
+#include "support/temporary_directory.h"
+
+namespace umpre {
+namespace {
+
+using std::string_view_literals::operator""sv;
+using Stop = LineSkipper::Stop;
+using enum TokenKind;
+
+// A file that is read through windows, and an output in step with it.
+struct Skipping {
+    Skipping(std::string_view text, std::size_t windowSize) : file(comments, {false, windowSize}) {
+        isOpen = file.open(directory.write("main", text));
+        output.redirect(sink);
+        output.countLines(1);
+    }
+
+    [[nodiscard]] const std::string& written() {
+        output.flush();
+        return sink.bytes();
+    }
+
+    testing::TemporaryDirectory directory;
+    testing::RecordingCommentSink comments;
+    CppFileScanner file;
+    bool isOpen = false;
+    testing::RecordingSink sink;
+    OutputWriter output;
+    LineSkipper skipper{output};
+};
+
+// What is written for a text, and the text of the token that is left next.
+struct Row {
+    std::string_view text;
+    std::string_view written;
+    std::string_view next;
+};
+
+void expectSkips(const std::vector<Row>& table, Stop stop, Stop from = Stop::LineStart) {
+    for (const Row& row : table) {
+        SCOPED_TRACE(::testing::PrintToString(row.text));
+        Skipping skipping(row.text, 1024);
+        ASSERT_TRUE(skipping.isOpen);
+        EXPECT_EQ(skipping.skipper.skip(skipping.file, from), stop);
+        EXPECT_EQ(skipping.written(), row.written);
+        EXPECT_EQ(skipping.file.next().text, row.next);
+    }
+}
+
+TEST(LineSkipper, WritesALineFeedForEachLine) {
+    expectSkips(
+        {
+            {"", "", ""},
+            {"a\n\n  \nMACRO \"b\" 1\n", "\n\n\n\n", ""},
+            {"a # b\n##c\n", "\n\n", ""},
+            {"x\0y\n\xE9\n"sv, "\n\n", ""},
+            {"a\r\nb\rc\n\r", "\n\n\n\n", ""},
+        },
+        Stop::LineStart);
+}
+
+TEST(LineSkipper, WritesALineFeedForEachLineOfAComment) {
+    expectSkips({{"a /* b\n\n */ c\n// d\ne\n", "\n\n\n\n\n", ""}}, Stop::LineStart);
+}
+
+TEST(LineSkipper, StopsAtADirective) {
+    expectSkips(
+        {
+            {"#x\n", "", "#"},
+            {"a\n#x\n", "\n", "#"},
+            {"a\n  #x\n", "\n", "#"},
+            {"a\n/**/#x\n", "\n", "#"},
+            {"a\n /* \n */ /* */ #x\n", "\n\n", "#"},
+            {"a\n\\\n#x\n", "\n", "#"},
+            {"a\n \\\r\n /**/ #x\n", "\n", "#"},
+            {"a\n\r\n#x\n", "\n\n", "#"},
+            {"a\r#x\n", "\n", "#"},
+        },
+        Stop::LineStart);
+}
+
+TEST(LineSkipper, KnowsWhatIsNoDirective) {
+    expectSkips(
+        {
+            {"a \\\n#b\n", "\n", ""},
+            {"\"a\" #b\n'a' #b\n", "\n\n", ""},
+            {"a /*\n*/ #b\n", "\n\n", ""},
+            {"/*\n#b\n*/\n", "\n\n\n", ""},
+            {"// a\\\n", "\n", ""},
+            {"\"/*\" a\n'//*' b\n", "\n\n", ""},
+        },
+        Stop::LineStart);
+}
+
+TEST(LineSkipper, GoesOnWithinALine) {
+    expectSkips({{"#a\n#b\n", "\n", "#"}, {"\n#b\n", "\n", "#"}}, Stop::LineStart, Stop::InLine);
+}
+
+TEST(LineSkipper, LeavesALastLineThatHasNoLineEndToBeClosed) {
+    expectSkips({{"a\nb", "\n", ""}}, Stop::InLine);
+    for (const std::string_view text : {"a", "a\n \\\n", "\n /* a */", "// a\r", "a\n "}) {
+        Skipping skipping(text, 1024);
+        while (skipping.skipper.skip(skipping.file, Stop::LineStart) == Stop::InLine
+               && skipping.file.next().kind != NEWLINE) {
+        }
+        Skipping scanned(text, 1024);
+        Token last = scanned.file.next();
+        for (Token token = last; token.kind != END_OF_INPUT; token = scanned.file.next()) {
+            last = token;
+        }
+        EXPECT_EQ(last.kind, NEWLINE) << ::testing::PrintToString(text);
+    }
+}
+
+TEST(LineSkipper, LeavesWhatTheWindowDoesNotHoldToTheScanner) {
+    Skipping skipping("a\n/* b c d e f g */ #h\n", 8);
+    EXPECT_EQ(skipping.skipper.skip(skipping.file, Stop::LineStart), Stop::LineStart);
+    EXPECT_EQ(skipping.file.next().text, " ");
+    const std::string literal = "\"" + std::string(100, 'c') + "\"";
+    Skipping other("a\nb " + literal + " d\n", 8);
+    EXPECT_EQ(other.skipper.skip(other.file, Stop::LineStart), Stop::InLine);
+    EXPECT_EQ(other.file.next().text, literal);
+}
+
+TEST(LineSkipper, KeepsTheOutputInStep) {
+    Skipping skipping("a\nb\n\n#c\n", 1024);
+    EXPECT_EQ(skipping.skipper.skip(skipping.file, Stop::LineStart), Stop::LineStart);
+    EXPECT_TRUE(skipping.output.isAt(skipping.file.position()));
+    Skipping comment("/*\n*/\n#c\n", 1024);
+    EXPECT_EQ(comment.skipper.skip(comment.file, Stop::LineStart), Stop::LineStart);
+    EXPECT_EQ(comment.file.position().line, 3);
+    EXPECT_FALSE(comment.output.isAt(comment.file.position()));
+}
+
+}  // namespace
+}  // namespace umpre
