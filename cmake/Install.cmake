@@ -8,7 +8,21 @@ set(package_dir ${CMAKE_INSTALL_LIBDIR}/cmake/umpre)
 install(TARGETS umpre umpre-lines EXPORT umpreProgramTargets RUNTIME COMPONENT programs)
 install(FILES docs/umpre.1 docs/umpre-lines.1
     DESTINATION ${CMAKE_INSTALL_MANDIR}/man1 COMPONENT programs)
-install(FILES README.md LICENSE TYPE DOC COMPONENT programs)
+install(FILES README.md CHANGELOG.md CONTRIBUTING.md LICENSE TYPE DOC COMPONENT programs)
+install(DIRECTORY docs TYPE DOC COMPONENT programs FILES_MATCHING PATTERN *.md)
+install(FILES completions/umpre.bash RENAME umpre
+    DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions COMPONENT programs)
+install(FILES completions/umpre.bash RENAME umpre-lines
+    DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions COMPONENT programs)
+# Where zsh looks: packages of the system have a folder of their own.
+set(zsh_functions site-functions)
+if(CMAKE_INSTALL_PREFIX STREQUAL "/usr")
+    set(zsh_functions vendor-completions)
+endif()
+install(FILES completions/_umpre
+    DESTINATION ${CMAKE_INSTALL_DATADIR}/zsh/${zsh_functions} COMPONENT programs)
+install(FILES completions/umpre.fish completions/umpre-lines.fish
+    DESTINATION ${CMAKE_INSTALL_DATADIR}/fish/vendor_completions.d COMPONENT programs)
 
 configure_package_config_file(cmake/umpreConfig.cmake.in umpreConfig.cmake
     INSTALL_DESTINATION ${package_dir})

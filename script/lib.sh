@@ -26,6 +26,10 @@ test_packages=(
     "pkg-config|pkg-config|flags to build with the library"
     "libsqlite3-dev|/usr/include/sqlite3.h|headers to preprocess"
 )
+# Only for what script/package does.
+package_packages=(
+    "dpkg-dev|dpkg-shlibdeps|finds what the programs depend on"
+)
 
 say() {
     printf '%s\n' "$*" >&2

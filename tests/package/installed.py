@@ -32,11 +32,19 @@ lib/cmake/umpre/umpreProgramTargets-release.cmake
 lib/cmake/umpre/umpreProgramTargets.cmake
 lib/libumpre.a
 lib/pkgconfig/umpre.pc
+share/bash-completion/completions/umpre
+share/bash-completion/completions/umpre-lines
+share/doc/umpre/CHANGELOG.md
+share/doc/umpre/CONTRIBUTING.md
 share/doc/umpre/LICENSE
 share/doc/umpre/README.md
+share/fish/vendor_completions.d/umpre-lines.fish
+share/fish/vendor_completions.d/umpre.fish
 share/man/man1/umpre-lines.1
 share/man/man1/umpre.1
+share/zsh/site-functions/_umpre
 """.split()
+FILES += [f"share/doc/umpre/docs/{page.name}" for page in (ROOT / "docs").glob("*.md")]
 
 
 def run(*command, **options):
