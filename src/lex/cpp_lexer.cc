@@ -22,6 +22,24 @@ namespace {
 // The text of every comment's token; the generated scanner wants a pointer to non-const.
 std::array<char, 2> blank{' ', '\0'};
 
+// What a token's first byte tells of it. The generated scanner is for comments, continuations, line
+// ends and zero bytes.
+enum class Beginning : std::uint8_t { Other, Spelled, Blank, Quote };
+
+constexpr std::array<Beginning, 256> kBeginnings = [] {
+    std::array<Beginning, 256> beginnings{};
+    beginnings.fill(Beginning::Spelled);
+    const auto set = [&beginnings](std::string_view bytes, Beginning as) {
+        for (const char byte : bytes) {
+            beginnings[static_cast<unsigned char>(byte)] = as;
+        }
+    };
+    set(" \t\v\f", Beginning::Blank);
+    set("\"'", Beginning::Quote);
+    set({"/\\\r\n\0", 5}, Beginning::Other);
+    return beginnings;
+}();
+
 }  // namespace
 
 CppLexer::CppLexer(CommentSink& commentSink, const RunOptions& options)
@@ -74,8 +92,13 @@ Token CppLexer::lex() {
     if (yy_c_buf_p >= limit_ && !refill(yy_c_buf_p, Need::Tokens)) {
         return {};
     }
-    if (!plainRoad_ && (yy_hold_char == '"' || yy_hold_char == '\'')) {
-        return quoted();
+    if (!plainRoad_) {
+        switch (kBeginnings[static_cast<unsigned char>(yy_hold_char)]) {
+        case Beginning::Spelled: return take(tokenAt(yy_c_buf_p));
+        case Beginning::Blank: return take({TokenKind::WHITESPACE, {yy_c_buf_p, 1}});
+        case Beginning::Quote: return quoted();
+        case Beginning::Other: break;
+        }
     }
     const auto kind = static_cast<TokenKind>(yylex());
     *yy_c_buf_p = yy_hold_char;
@@ -84,6 +107,11 @@ Token CppLexer::lex() {
     case TokenKind::WHITESPACE: return {kind, {yytext, 1}};
     default: return {kind, {yytext, static_cast<std::size_t>(yy_c_buf_p - yytext)}};
     }
+}
+
+Token CppLexer::take(const Token& token) {
+    moveTo(yy_c_buf_p + token.text.size());
+    return token;
 }
 
 // The two literal rules, by hand: the generated scanner starts a long literal anew at each zero

@@ -71,6 +71,7 @@ private:
     void moveTo(char* position) noexcept;
     [[nodiscard]] bool refill(char* position, InputBuffer::Need need);
     [[nodiscard]] bool readOn(char*& position, InputBuffer::Need need);
+    [[nodiscard]] Token take(const Token& token);
     [[nodiscard]] Token quoted();
 
     CommentSink& commentSink_;

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "lex/spelling.h"
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
 
@@ -42,7 +43,15 @@ constexpr std::size_t kLongestWord = 7;
     return at;
 }
 
-constexpr std::string_view kPunctuators = "#(),?:|^&<>+-*/%!~";
+// The kinds of all bytes as tokens by themselves.
+constexpr std::array<TokenKind, 256> kSingles = [] {
+    std::array<TokenKind, 256> kinds{};
+    kinds.fill(OTHER);
+    for (const char byte : std::string_view("#(),?:|^&<>+-*/%!~")) {
+        kinds[static_cast<unsigned char>(byte)] = static_cast<TokenKind>(byte);
+    }
+    return kinds;
+}();
 
 // Returns the kind of a punctuator of two characters, or OTHER if these are none.
 [[nodiscard]] TokenKind kindOfPair(char first, char second) noexcept {
@@ -122,8 +131,7 @@ Token tokenAt(const char* at) noexcept {
         return {pair, {at, 2}};
     }
     const bool isComment = *at == '/' && (at[1] == '/' || at[1] == '*');
-    const bool isPunctuator = kPunctuators.find(*at) != std::string_view::npos && !isComment;
-    return {isPunctuator ? static_cast<TokenKind>(*at) : OTHER, {at, 1}};
+    return {isComment ? OTHER : kSingles[static_cast<unsigned char>(*at)], {at, 1}};
 }
 
 }  // namespace umpre

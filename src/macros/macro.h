@@ -8,6 +8,7 @@
 #include <string_view>
 
 #include "lex/no_expand_set.h"
+#include "lex/shared_text.h"
 
 namespace umpre {
 
@@ -40,7 +41,9 @@ public:
 
     [[nodiscard]] bool functionLike() const noexcept { return functionLike_; }
 
-    /// The text made ready for use; null until that is worth keeping.
+    /// The text made ready for use, of an object-like macro and of a function-like one; nothing
+    /// until that is worth keeping.
+    mutable SharedText tokens;
     mutable std::shared_ptr<const MacroBody> body;
     mutable bool wasUsed = false;
 

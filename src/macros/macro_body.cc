@@ -190,8 +190,8 @@ private:
 }  // namespace
 
 SharedText BodyMaker::tokensOf(const Macro& macro) {
-    if (macro.body != nullptr) {
-        return macro.body->tokens;
+    if (macro.tokens) {
+        return macro.tokens;
     }
     if (!macro.wasUsed) {
         macro.wasUsed = true;
@@ -199,12 +199,10 @@ SharedText BodyMaker::tokensOf(const Macro& macro) {
         macros_.setNames(tokens.edit());
         return tokens;
     }
-    auto body = std::make_shared<MacroBody>();
-    body->tokens = SharedText::alone();
-    lexer_.append(body->tokens.edit(), macro.text());
-    macros_.enterNames(body->tokens.edit());
-    macro.body = std::move(body);
-    return macro.body->tokens;
+    macro.tokens = SharedText::alone();
+    lexer_.append(macro.tokens.edit(), macro.text());
+    macros_.enterNames(macro.tokens.edit());
+    return macro.tokens;
 }
 
 const MacroBody& BodyMaker::bodyOf(const Macro& macro) {

@@ -86,14 +86,12 @@ void MacroExpander::refresh(MacroName& name) {
 }
 
 MacroExpander::Outcome MacroExpander::replaceObject(const MacroName& name) {
-    SharedText tokens = bodies_.tokensOf(name.macro);
-    const NoExpandSet noExpand = sets_.with(sources_.noExpandSet(), name);
-    if (!sources_.plainRoad() && isText(*tokens)) {
-        text_ = std::move(tokens);
-        textSet_ = noExpand;
+    text_ = bodies_.tokensOf(name.macro);
+    if (!sources_.plainRoad() && isText(*text_)) {
         return Outcome::Text;
     }
-    sources_.pushSlice(TextSlice::whole(std::move(tokens)), noExpand);
+    const NoExpandSet noExpand = sets_.with(sources_.noExpandSet(), name);
+    sources_.pushSlice(TextSlice::whole(std::move(text_)), noExpand);
     return Outcome::Pushed;
 }
 
@@ -250,7 +248,9 @@ bool MacroExpander::readName(const Token& token, Pieces& result) {
         lexer_.append(result.open(), skipped_);
         result.append({token.kind, name->text, name}, noExpand);
         break;
-    case Outcome::Text: result.append(*text_, 0, text_->size(), textSet_); break;
+    case Outcome::Text:
+        result.append(*text_, 0, text_->size(), sets_.with(noExpand, *name));
+        break;
     case Outcome::Pushed: break;
     case Outcome::Begun: return false;
     case Outcome::Abandoned: result.append({token.kind, name->text, name}, noExpand); break;

@@ -57,7 +57,7 @@ private:
     enum class Outcome {
         Name,       // the name is just a name, with no argument list read
         Uncalled,   // a function-like macro without "(": `skipped_` comes before the name
-        Text,       // a replacement that need not be read again: `text_`, with the set `textSet_`
+        Text,       // a replacement that need not be read again: `text_`
         Pushed,     // a replacement was pushed
         Begun,      // an invocation was added to `invocations_`
         Abandoned,  // an invocation with the wrong arguments: the name is left
@@ -98,7 +98,6 @@ private:
     std::string skipped_;
     std::string written_;
     SharedText text_;
-    NoExpandSet textSet_;
 };
 
 }  // namespace umpre

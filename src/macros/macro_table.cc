@@ -84,6 +84,7 @@ void MacroTable::replace(MacroName& name, const MacroText& definition) {
     macro.parameterCount_ =
         definition.parameters.empty() ? 0 : static_cast<std::uint32_t>(commas) + 1;
     macro.functionLike_ = definition.functionLike;
+    macro.tokens = {};
     macro.body.reset();
     macro.wasUsed = false;
     name.isDefined = true;
@@ -106,6 +107,7 @@ void MacroTable::undefine(std::string_view name) {
     MacroName* const entry = find(name);
     if (entry != nullptr) {
         entry->isDefined = false;
+        entry->macro.tokens = {};
         entry->macro.body.reset();
     }
 }

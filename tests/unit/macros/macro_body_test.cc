@@ -104,7 +104,7 @@ TEST(MacroBody, OfAnObjectLikeMacroIsKeptFromTheSecondUseOn) {
     BodyMaker maker(lexer, macros);
     const Macro& macro = defined(macros, {"x", "", false});
     (void)maker.tokensOf(macro);
-    EXPECT_EQ(macro.body, nullptr);
+    EXPECT_FALSE(macro.tokens);
     const SharedText second = maker.tokensOf(macro);
     const SharedText third = maker.tokensOf(macro);
     EXPECT_EQ(&*second, &*third);
