@@ -248,9 +248,7 @@ bool MacroExpander::readName(const Token& token, Pieces& result) {
         lexer_.append(result.open(), skipped_);
         result.append({token.kind, name->text, name}, noExpand);
         break;
-    case Outcome::Text:
-        result.append(*text_, 0, text_->size(), sets_.with(noExpand, *name));
-        break;
+    case Outcome::Text: result.append(*text_, 0, text_->size(), sets_.with(noExpand, *name)); break;
     case Outcome::Pushed: break;
     case Outcome::Begun: return false;
     case Outcome::Abandoned: result.append({token.kind, name->text, name}, noExpand); break;
