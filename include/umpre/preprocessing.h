@@ -7,6 +7,7 @@
 #include <string_view>
 
 #include "umpre/diagnostic.h"
+#include "umpre/event.h"
 #include "umpre/export.h"
 
 /// All that the library has.
@@ -60,6 +61,11 @@ public:
     void setOutput(OutputSink sink);
     /// Sets where problems in the input go.
     void setDiagnostics(DiagnosticSink sink);
+
+    /// Sets who serves included files that are not on the disk.
+    void setIncludeResolver(IncludeResolver resolver);
+    /// Sets who is told what the run does.
+    void setObserver(Observer observer);
 
     /// Preprocesses the source from its beginning to its end.
     [[nodiscard]] Outcome run() const;

@@ -45,6 +45,8 @@ struct Preprocessing::Settings {
     std::vector<std::string> includeDirectories;
     OutputSink outputSink;
     DiagnosticSink diagnostics;
+    IncludeResolver resolver;
+    Observer observer;
 };
 
 Preprocessing::Preprocessing() : settings_(std::make_unique<Settings>()) {}
@@ -84,10 +86,20 @@ void Preprocessing::setDiagnostics(DiagnosticSink sink) {
     settings_->diagnostics = std::move(sink);
 }
 
+void Preprocessing::setIncludeResolver(IncludeResolver resolver) {
+    settings_->resolver = std::move(resolver);
+}
+
+void Preprocessing::setObserver(Observer observer) {
+    settings_->observer = std::move(observer);
+}
+
 Outcome Preprocessing::Settings::run() const {
     SinkBytes output(outputSink);
     Preprocessor engine(diagnostics);
     engine.setOutput(output);
+    engine.setResolver(resolver);
+    engine.setObserver(observer);
     for (const Definition& definition : definitions) {
         engine.defineMacro(definition.name, definition.text);
     }

@@ -16,18 +16,41 @@ void Inclusion::includeDirective() {
 }
 
 bool Inclusion::openInclude(const std::string& name, bool quoted) {
-    if (quoted && sources_.pushFile(name)) {
+    if (quoted && enter(name)) {
         return true;
     }
     std::string path;
     for (const std::string& directory : includeDirectories_) {
         path.assign(directory).append("/").append(name);
-        if (sources_.pushFile(path)) {
+        if (enter(path)) {
             return true;
         }
     }
     reporter_.reportError("Cannot open file: " + name);
     return false;
+}
+
+bool Inclusion::enter(const std::string& path) {
+    if (!observer_) {
+        return open(path);
+    }
+    const SourcePosition includer = sources_.position();
+    const bool isOpen = open(path);
+    observer_({isOpen ? Event::Kind::FileEntered : Event::Kind::FileMissed, path, includer.fileName,
+               includer.line});
+    return isOpen;
+}
+
+bool Inclusion::open(const std::string& path) {
+    if (!resolver_) {
+        return sources_.pushFile(path);
+    }
+    const IncludeAnswer answer = resolver_(path);
+    if (answer.kind == IncludeAnswer::Kind::Text) {
+        sources_.pushFileText(path, answer.text);
+        return true;
+    }
+    return answer.kind == IncludeAnswer::Kind::Disk && sources_.pushFile(path);
 }
 
 std::optional<Inclusion::Operand> Inclusion::readOperand() {

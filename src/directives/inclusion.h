@@ -5,12 +5,14 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "lex/reporter.h"
 #include "lex/scanner_stack.h"
 #include "lex/text_lexer.h"
 #include "macros/macro_expander.h"
+#include "umpre/event.h"
 
 namespace umpre {
 
@@ -26,6 +28,12 @@ public:
         includeDirectories_.emplace_back(directory);
     }
 
+    /// Asks before a file is looked for on the disk; nobody, if empty.
+    void setResolver(IncludeResolver resolver) { resolver_ = std::move(resolver); }
+
+    /// Tells which files are entered and which are missed; nobody, if empty.
+    void setObserver(Observer observer) { observer_ = std::move(observer); }
+
     /// Reads the rest of the line and enters the file that it names. The line end is read only if a
     /// file is named.
     void includeDirective();
@@ -40,6 +48,8 @@ private:
         bool quoted;
     };
 
+    [[nodiscard]] bool enter(const std::string& path);
+    [[nodiscard]] bool open(const std::string& path);
     [[nodiscard]] std::optional<Operand> readOperand();
     [[nodiscard]] std::optional<Operand> readName();
 
@@ -48,6 +58,8 @@ private:
     TextLexer& lexer_;
     Reporter& reporter_;
     std::vector<std::string> includeDirectories_;
+    IncludeResolver resolver_;
+    Observer observer_;
 };
 
 }  // namespace umpre

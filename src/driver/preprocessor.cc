@@ -33,11 +33,17 @@ bool Preprocessor::openSource(const std::string& sourceName, const std::string& 
         diagnostics_.reportFatal("cannot open " + sourceName);
         return false;
     }
+    if (observer_) {
+        observer_({Event::Kind::FileEntered, sourceName, {}, 0});
+    }
     return true;
 }
 
 void Preprocessor::openText(const std::string& sourceName, std::string_view text) {
     sources_.pushFileText(sourceName, text);
+    if (observer_) {
+        observer_({Event::Kind::FileEntered, sourceName, {}, 0});
+    }
 }
 
 RunResult Preprocessor::run() {

@@ -4,6 +4,7 @@
 
 #include <string>
 #include <string_view>
+#include <utility>
 
 #include "directives/conditionals.h"
 #include "directives/definitions.h"
@@ -20,6 +21,7 @@
 #include "lex/text_reader.h"
 #include "macros/macro_expander.h"
 #include "macros/macro_table.h"
+#include "umpre/event.h"
 
 namespace umpre {
 
@@ -46,6 +48,15 @@ public:
     /// Adds a directory to search for included files, after those added before.
     void addIncludeDirectory(std::string_view directory) {
         inclusion_.addIncludeDirectory(directory);
+    }
+
+    /// Asks before an included file is looked for on the disk.
+    void setResolver(IncludeResolver resolver) { inclusion_.setResolver(std::move(resolver)); }
+
+    /// Tells what the run does.
+    void setObserver(const Observer& observer) {
+        observer_ = observer;
+        inclusion_.setObserver(observer);
     }
 
     /// Sets where the output goes; must be called before a source is opened.
@@ -83,6 +94,7 @@ private:
     void endSkippedLine();
 
     RunOptions options_;
+    Observer observer_;
     OutputWriter output_;
     TextLexer lexer_;  // its texts are held by sources and macros
     ScannerStack sources_;

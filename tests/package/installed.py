@@ -21,6 +21,7 @@ FILES = """
 bin/umpre
 bin/umpre-lines
 include/umpre/diagnostic.h
+include/umpre/event.h
 include/umpre/export.h
 include/umpre/preprocessing.h
 include/umpre/version.h

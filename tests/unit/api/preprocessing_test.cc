@@ -164,6 +164,47 @@ TEST(Preprocessing, TellsThatThereIsNoMemory) {
     EXPECT_EQ(f.messages.back().text, "out of dynamic memory in yy_create_buffer()");
 }
 
+TEST(Preprocessing, AsksForIncludedFiles) {
+    const testing::TemporaryDirectory folder;
+    const std::string onDisk = folder.write("disk.inc", "from the disk\n");
+    Fixture f;
+    f.preprocessing.addIncludeDirectory("one");
+    f.preprocessing.addIncludeDirectory("two");
+    std::vector<std::string> asked;
+    f.preprocessing.setIncludeResolver([&](std::string_view name) -> IncludeAnswer {
+        asked.emplace_back(name);
+        if (name == "two/a.inc") {
+            return {IncludeAnswer::Kind::Text, "from memory\n"};
+        }
+        return {name == onDisk ? IncludeAnswer::Kind::Disk : IncludeAnswer::Kind::Absent, {}};
+    });
+    EXPECT_EQ(f.run("#include \"a.inc\"\n#include \"" + onDisk + "\"\n"), Outcome::Clean);
+    EXPECT_EQ(f.output,
+              "#line 1 \"main\"\n#line 1 \"two/a.inc\"\nfrom memory\n#line 2 \"main\"\n"
+              "#line 1 \""
+                  + onDisk + "\"\nfrom the disk\n#line 3 \"main\"\n");
+    EXPECT_EQ(asked, (std::vector<std::string>{"a.inc", "one/a.inc", "two/a.inc", onDisk}));
+}
+
+TEST(Preprocessing, TellsWhichFilesAreEnteredAndMissed) {
+    Fixture f;
+    f.preprocessing.addIncludeDirectory("one");
+    f.preprocessing.setIncludeResolver([](std::string_view name) -> IncludeAnswer {
+        return {name == "one/a" ? IncludeAnswer::Kind::Text : IncludeAnswer::Kind::Absent, {}};
+    });
+    std::string told;
+    f.preprocessing.setObserver([&told](const Event& event) {
+        told.append(event.kind == Event::Kind::FileEntered ? "+" : "-").append(event.name);
+        told.append("@")
+            .append(event.file)
+            .append(":")
+            .append(std::to_string(event.line))
+            .append(" ");
+    });
+    EXPECT_EQ(f.run("#include \"a\"\n"), Outcome::Clean);
+    EXPECT_EQ(told, "+main@:0 -a@main:2 +one/a@main:2 ");
+}
+
 TEST(Preprocessing, NeedsNoSinks) {
     Preprocessing preprocessing;
     preprocessing.setSourceText("main", "#endif\n");
