@@ -41,23 +41,29 @@ public:
 
     [[nodiscard]] bool functionLike() const noexcept { return functionLike_; }
 
+    [[nodiscard]] bool wasUsed() const noexcept { return wasUsed_; }
+
+    void noteUse() const noexcept { wasUsed_ = true; }
+
     /// The text made ready for use, of an object-like macro and of a function-like one; nothing
     /// until that is worth keeping.
     mutable SharedText tokens;
     mutable std::shared_ptr<const MacroBody> body;
-    mutable bool wasUsed = false;
 
 private:
     friend class MacroTable;
 
+    // Large inputs have many definitions, so the members are as small as they can be.
+
     // The parameters, behind them the text and a zero byte.
     char* bytes_ = nullptr;
-    std::size_t capacity_ = 0;
     std::size_t textSize_ = 0;
-    std::size_t parametersSize_ = 0;
+    std::uint32_t capacity_ = 0;
+    std::uint32_t parametersSize_ = 0;
     std::uint32_t parameterCount_ = 0;
     bool functionLike_ = false;
     bool wasDefined_ = false;  // now or earlier
+    mutable bool wasUsed_ = false;
 };
 
 /// A name that was defined at least once, and its last definition.

@@ -193,8 +193,8 @@ SharedText BodyMaker::tokensOf(const Macro& macro) {
     if (macro.tokens) {
         return macro.tokens;
     }
-    if (!macro.wasUsed) {
-        macro.wasUsed = true;
+    if (!macro.wasUsed()) {
+        macro.noteUse();
         SharedText tokens = lexer_.lexed(macro.text());
         macros_.setNames(tokens.edit());
         return tokens;

@@ -13,6 +13,12 @@ namespace {
 
 constexpr std::size_t kFirstSlots = 256;
 
+// Counts the names in a text like "a,b".
+[[nodiscard]] std::uint32_t countOf(std::string_view names) noexcept {
+    const auto commas = std::count(names.begin(), names.end(), ',');
+    return names.empty() ? 0 : static_cast<std::uint32_t>(commas) + 1;
+}
+
 }  // namespace
 
 MacroTable::MacroTable() : slots_(kFirstSlots), unknown_(1) {}
@@ -73,20 +79,21 @@ void MacroTable::replace(MacroName& name, const MacroText& definition) {
     Macro& macro = name.macro;
     const std::size_t size = definition.parameters.size() + definition.text.size() + 1;
     if (size > macro.capacity_) {
-        macro.capacity_ = std::max(size, 2 * macro.capacity_);
-        macro.bytes_ = newBytes(macro.capacity_);
+        // What is too large to be told is not used again.
+        const std::size_t capacity = std::max(size, std::size_t{2} * macro.capacity_);
+        macro.bytes_ = newBytes(capacity);
+        macro.capacity_ = static_cast<std::uint32_t>(std::min<std::size_t>(capacity, UINT32_MAX));
     }
-    macro.parametersSize_ = definition.parameters.copy(macro.bytes_, definition.parameters.size());
-    macro.textSize_ =
-        definition.text.copy(macro.bytes_ + macro.parametersSize_, definition.text.size());
+    const std::size_t parametersSize =
+        definition.parameters.copy(macro.bytes_, definition.parameters.size());
+    macro.textSize_ = definition.text.copy(macro.bytes_ + parametersSize, definition.text.size());
     macro.bytes_[size - 1] = '\0';
-    const auto commas = std::count(definition.parameters.begin(), definition.parameters.end(), ',');
-    macro.parameterCount_ =
-        definition.parameters.empty() ? 0 : static_cast<std::uint32_t>(commas) + 1;
+    macro.parametersSize_ = static_cast<std::uint32_t>(parametersSize);
+    macro.parameterCount_ = countOf(definition.parameters);
     macro.functionLike_ = definition.functionLike;
     macro.tokens = {};
     macro.body.reset();
-    macro.wasUsed = false;
+    macro.wasUsed_ = false;
     name.isDefined = true;
     if (!macro.wasDefined_) {
         macro.wasDefined_ = true;
@@ -112,7 +119,7 @@ void MacroTable::undefine(std::string_view name) {
     }
 }
 
-std::size_t MacroTable::slotOf(std::string_view name, std::uint32_t hash) const {
+std::size_t MacroTable::slotOf(std::string_view name, std::uint32_t hash) {
     const std::size_t mask = slots_.size() - 1;
     std::size_t at = hash & mask;
     while (slots_[at].number != 0 && (slots_[at].hash != hash || nameIn(slots_[at]).text != name)) {
@@ -129,14 +136,18 @@ MacroName& MacroTable::enter(std::string_view name) {
             grow();
             at = slotOf(name, hash);
         }
-        if (nameCount_ % kNamesTogether == 0) {
-            names_.push_back(std::make_unique<Names>());
-        }
         slots_[at] = {hash, static_cast<std::uint32_t>(++nameCount_)};
         char* const bytes = newBytes(name.size());
-        nameIn(slots_[at]).text = {bytes, name.copy(bytes, name.size())};
+        newName().text = {bytes, name.copy(bytes, name.size())};
     }
     return nameIn(slots_[at]);
+}
+
+MacroName& MacroTable::newName() {
+    if (names_.empty() || names_.back().size() == kNamesTogether) {
+        names_.emplace_back().reserve(kNamesTogether);
+    }
+    return names_.back().emplace_back();
 }
 
 char* MacroTable::newBytes(std::size_t size) {

@@ -2,11 +2,9 @@
 #ifndef UMPRE_MACROS_MACRO_TABLE_H
 #define UMPRE_MACROS_MACRO_TABLE_H
 
-#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <deque>
-#include <memory>
 #include <memory_resource>
 #include <string_view>
 #include <vector>
@@ -70,20 +68,20 @@ private:
     };
 
     static constexpr std::size_t kNamesTogether = 256;
-    using Names = std::array<MacroName, kNamesTogether>;
 
-    [[nodiscard]] MacroName& nameIn(Slot slot) const {
-        return (*names_[(slot.number - 1) / kNamesTogether])[(slot.number - 1) % kNamesTogether];
+    [[nodiscard]] MacroName& nameIn(Slot slot) noexcept {
+        return names_[(slot.number - 1) / kNamesTogether][(slot.number - 1) % kNamesTogether];
     }
 
-    [[nodiscard]] std::size_t slotOf(std::string_view name, std::uint32_t hash) const;
+    [[nodiscard]] std::size_t slotOf(std::string_view name, std::uint32_t hash);
     [[nodiscard]] MacroName& enter(std::string_view name);
+    [[nodiscard]] MacroName& newName();
     [[nodiscard]] char* newBytes(std::size_t size);
     void addToFilter(const Name& name);
     void grow();
 
     std::pmr::monotonic_buffer_resource bytes_;  // of names and definitions
-    std::vector<std::unique_ptr<Names>> names_;
+    std::vector<std::vector<MacroName>> names_;  // each of them keeps its first room
     std::size_t nameCount_ = 0;
     std::vector<Slot> slots_;  // open addressing; at most three of four are taken
     NameFilter filter_;
