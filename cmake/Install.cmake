@@ -5,12 +5,14 @@ include(CMakePackageConfigHelpers)
 
 set(package_dir ${CMAKE_INSTALL_LIBDIR}/cmake/umpre)
 
-install(TARGETS umpre umpre-lines EXPORT umpreProgramTargets RUNTIME COMPONENT programs)
-install(FILES docs/umpre.1 docs/umpre-lines.1
+install(TARGETS umpre umpre-deps umpre-lines EXPORT umpreProgramTargets RUNTIME COMPONENT programs)
+install(FILES docs/umpre.1 docs/umpre-deps.1 docs/umpre-lines.1
     DESTINATION ${CMAKE_INSTALL_MANDIR}/man1 COMPONENT programs)
 install(FILES README.md CHANGELOG.md CONTRIBUTING.md LICENSE TYPE DOC COMPONENT programs)
 install(DIRECTORY docs TYPE DOC COMPONENT programs FILES_MATCHING PATTERN *.md)
 install(FILES completions/umpre.bash RENAME umpre
+    DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions COMPONENT programs)
+install(FILES completions/umpre.bash RENAME umpre-deps
     DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions COMPONENT programs)
 install(FILES completions/umpre.bash RENAME umpre-lines
     DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions COMPONENT programs)
@@ -21,7 +23,7 @@ if(CMAKE_INSTALL_PREFIX STREQUAL "/usr")
 endif()
 install(FILES completions/_umpre
     DESTINATION ${CMAKE_INSTALL_DATADIR}/zsh/${zsh_functions} COMPONENT programs)
-install(FILES completions/umpre.fish completions/umpre-lines.fish
+install(FILES completions/umpre.fish completions/umpre-deps.fish completions/umpre-lines.fish
     DESTINATION ${CMAKE_INSTALL_DATADIR}/fish/vendor_completions.d COMPONENT programs)
 
 configure_package_config_file(cmake/umpreConfig.cmake.in umpreConfig.cmake

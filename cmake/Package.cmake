@@ -18,6 +18,7 @@ and writes the result, line for line, with markers that say which file and
 line each part comes from. It knows tokens only, so text that is not C passes
 as well: shaders, linker scripts, interface definitions, assembler.
 
+umpre-deps writes which files that reads, as a rule for make.
 umpre-lines turns the markers into those of GNU tools, takes them out, or
 prints them as a map.")
 

@@ -28,6 +28,21 @@ _umpre() {
 }
 complete -F _umpre umpre
 
+_umpre_deps() {
+    case ${COMP_WORDS[COMP_CWORD - 1]} in
+    -I) _umpre_names -d "" && return ;;
+    -o | -MF) _umpre_names -f "" && return ;;
+    -s | -MT | -MQ) return ;;
+    esac
+    case ${COMP_WORDS[COMP_CWORD]} in
+    -I*) compopt -o nospace 2>/dev/null; _umpre_names -d -I ;;
+    -D*) compopt -o nospace 2>/dev/null; _umpre_words -D ;;
+    -*) _umpre_words "-I -D -o -s -M -MM -MD -MMD -MF -MT -MQ -MP --absent -v --version -h --help" ;;
+    *) _umpre_names -f "" ;;
+    esac
+}
+complete -F _umpre_deps umpre-deps
+
 _umpre_lines() {
     case ${COMP_WORDS[COMP_CWORD]} in
     -*) _umpre_words "--gnu --strip --map -o -v --version -h --help" ;;

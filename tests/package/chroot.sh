@@ -25,12 +25,13 @@ in_chroot 'cd /root
 printf "#include \"pins.inc\"\nled = PIN(P, 7);\n" >main.src
 printf "#define PIN(port, n) port##n\n" >pins.inc
 umpre main.src
+umpre-deps main.src
 umpre main.src | umpre-lines --gnu
 umpre main.src | umpre-lines --strip --map
 umpre -v || true'
 printf '== man umpre\n'
 in_chroot '{ apt-get update && apt-get install -y --no-install-recommends man-db g++; } >/dev/null 2>&1
-for page in umpre umpre-lines; do MANWIDTH=80 man "$page" | col -b | head -n 12; done'
+for page in umpre umpre-deps umpre-lines; do MANWIDTH=80 man "$page" | col -b | head -n 12; done'
 printf '== build with the library\n'
 in_chroot 'dpkg -i /root/libumpre-dev_*.deb
 cat >/root/embed.cc <<END

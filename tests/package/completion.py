@@ -65,7 +65,7 @@ def main():
     parser.add_argument("shell", choices=["bash", "zsh", "fish"])
     arguments = parser.parse_args()
     wrong = []
-    for program in ["umpre", "umpre-lines"]:
+    for program in ["umpre", "umpre-deps", "umpre-lines"]:
         options = options_of(pathlib.Path(arguments.programs) / program)
         completed = offered(arguments.shell, program)
         wrong += [f"{program}: {option} is not offered" for option in sorted(options - completed)]

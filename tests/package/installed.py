@@ -19,6 +19,7 @@ ROOT = pathlib.Path(__file__).resolve().parent.parent.parent
 EXAMPLE = ROOT / "examples/embed"
 FILES = """
 bin/umpre
+bin/umpre-deps
 bin/umpre-lines
 include/umpre/diagnostic.h
 include/umpre/event.h
@@ -34,13 +35,16 @@ lib/cmake/umpre/umpreProgramTargets.cmake
 lib/libumpre.a
 lib/pkgconfig/umpre.pc
 share/bash-completion/completions/umpre
+share/bash-completion/completions/umpre-deps
 share/bash-completion/completions/umpre-lines
 share/doc/umpre/CHANGELOG.md
 share/doc/umpre/CONTRIBUTING.md
 share/doc/umpre/LICENSE
 share/doc/umpre/README.md
+share/fish/vendor_completions.d/umpre-deps.fish
 share/fish/vendor_completions.d/umpre-lines.fish
 share/fish/vendor_completions.d/umpre.fish
+share/man/man1/umpre-deps.1
 share/man/man1/umpre-lines.1
 share/man/man1/umpre.1
 share/zsh/site-functions/_umpre
@@ -62,7 +66,7 @@ def expect(what, actual, expected):
 
 
 def check_programs(prefix):
-    for program in ["umpre", "umpre-lines"]:
+    for program in ["umpre", "umpre-deps", "umpre-lines"]:
         version = subprocess.run([prefix / "bin" / program, "-v"], capture_output=True, text=True)
         expect(f"the first words of {program} -v", version.stdout.split()[:2], [program, "version"])
 

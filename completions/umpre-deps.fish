@@ -1,0 +1,17 @@
+# SPDX-License-Identifier: MIT
+# Completion of umpre-deps for fish.
+complete -c umpre-deps -s I -x -a '(__fish_complete_directories)' -d 'Search this directory for included files'
+complete -c umpre-deps -s D -x -d 'Define a macro'
+complete -c umpre-deps -s o -r -d 'Write the text to this file'
+complete -c umpre-deps -s s -x -d 'Name the source so in messages'
+complete -c umpre-deps -o M -d 'Only the rule'
+complete -c umpre-deps -o MM -d 'Only the rule'
+complete -c umpre-deps -o MD -d 'Write the rule beside the text'
+complete -c umpre-deps -o MMD -d 'Write the rule beside the text'
+complete -c umpre-deps -o MF -r -d 'Write the rule to this file'
+complete -c umpre-deps -o MT -x -d 'Target, as it is'
+complete -c umpre-deps -o MQ -x -d 'Target, escaped'
+complete -c umpre-deps -o MP -d 'Add an empty rule for each included file'
+complete -c umpre-deps -l absent -d 'Add what was looked for in vain'
+complete -c umpre-deps -s v -l version -d 'Show version number'
+complete -c umpre-deps -s h -l help -d 'Show help text'

@@ -1,0 +1,57 @@
+// SPDX-License-Identifier: MIT
+//
+// A blank or a number sign in a name gets a backslash, and the backslashes before it are doubled; a
+// dollar sign is doubled; every other backslash stays. Make and Ninja read that alike. A percent
+// sign matters to Make alone, in targets.
+#include "deps/rule.h"
+
+#include <cstddef>
+
+namespace umpre {
+namespace {
+
+std::string escaped(std::string_view name, std::string_view special) {
+    std::string text;
+    std::size_t backslashes = 0;  // just before
+    for (const char byte : name) {
+        if (special.find(byte) != std::string_view::npos) {
+            text.append(backslashes + 1, '\\');
+        } else if (byte == '$') {
+            text.push_back('$');
+        }
+        backslashes = byte == '\\' ? backslashes + 1 : 0;
+        text.push_back(byte);
+    }
+    return text;
+}
+
+}  // namespace
+
+std::string escapedFile(std::string_view name) {
+    return escaped(name, " \t#");
+}
+
+std::string escapedTarget(std::string_view name) {
+    return escaped(name, " \t#%");
+}
+
+std::string textOf(const Rule& rule) {
+    std::string targets;
+    for (const std::string& target : rule.targets) {
+        targets.append(targets.empty() ? "" : " ").append(target);
+    }
+    std::string text = targets + ":";
+    for (const std::string& file : rule.files) {
+        text.append(" \\\n  ").append(escapedFile(file));
+    }
+    text.append("\n");
+    for (const std::string& file : rule.absent) {
+        text.append(targets).append(": $(wildcard ").append(escapedFile(file)).append(")\n");
+    }
+    for (std::size_t at = 1; rule.phonyFiles && at < rule.files.size(); ++at) {
+        text.append(escapedTarget(rule.files[at])).append(":\n");
+    }
+    return text;
+}
+
+}  // namespace umpre
