@@ -29,7 +29,7 @@ install(FILES completions/umpre.fish completions/umpre-deps.fish completions/ump
 configure_package_config_file(cmake/umpreConfig.cmake.in umpreConfig.cmake
     INSTALL_DESTINATION ${package_dir})
 write_basic_package_version_file(umpreConfigVersion.cmake COMPATIBILITY SameMajorVersion)
-install(FILES ${PROJECT_BINARY_DIR}/umpreConfig.cmake ${PROJECT_BINARY_DIR}/umpreConfigVersion.cmake
+install(FILES cmake/umpre_preprocess.cmake ${PROJECT_BINARY_DIR}/umpreConfig.cmake ${PROJECT_BINARY_DIR}/umpreConfigVersion.cmake
     DESTINATION ${package_dir} COMPONENT programs)
 install(EXPORT umpreProgramTargets NAMESPACE umpre:: DESTINATION ${package_dir} COMPONENT programs)
 

@@ -32,6 +32,7 @@ lib/cmake/umpre/umpreLibraryTargets-release.cmake
 lib/cmake/umpre/umpreLibraryTargets.cmake
 lib/cmake/umpre/umpreProgramTargets-release.cmake
 lib/cmake/umpre/umpreProgramTargets.cmake
+lib/cmake/umpre/umpre_preprocess.cmake
 lib/libumpre.a
 lib/pkgconfig/umpre.pc
 share/bash-completion/completions/umpre
