@@ -4,15 +4,15 @@
 
 #include <algorithm>
 #include <cstddef>
-#include <cstring>
-#include <memory>
 #include <type_traits>
+#include <utility>
+#include <vector>
 
 namespace umpre {
 
 /// An array that grows at its end by several elements at a time, which the caller then writes. What
-/// a `std::vector` would do beyond that (to set them to zero first, to ask for room for each) shows
-/// where tokens are copied in small groups.
+/// a `std::vector` by itself would do beyond that (to set them to zero first, to ask for room for
+/// each) shows where tokens are copied in small groups.
 template <typename Element>
 class GrowingArray {
     static_assert(std::is_trivially_copyable_v<Element>);
@@ -41,14 +41,14 @@ public:
         if (count > capacity_ - size_) {
             grow(size_ + count);
         }
-        Element* const added = elements_.get() + size_;
+        Element* const added = elements_.data() + size_;
         size_ += count;
         return added;
     }
 
     [[nodiscard]] std::size_t size() const noexcept { return size_; }
 
-    [[nodiscard]] const Element* data() const noexcept { return elements_.get(); }
+    [[nodiscard]] const Element* data() const noexcept { return elements_.data(); }
 
     [[nodiscard]] Element& operator[](std::size_t index) noexcept { return elements_[index]; }
 
@@ -66,15 +66,11 @@ private:
     void grow(std::size_t needed) {
         constexpr std::size_t kFirst = 32 / sizeof(Element);
         const std::size_t capacity = std::max({needed, 2 * capacity_, kFirst});
-        auto larger = std::make_unique_for_overwrite<Element[]>(capacity + kSlack);
-        if (size_ > 0) {
-            std::memcpy(larger.get(), elements_.get(), size_ * sizeof(Element));
-        }
-        elements_ = std::move(larger);
+        elements_.resize(capacity + kSlack);
         capacity_ = capacity;
     }
 
-    std::unique_ptr<Element[]> elements_;
+    std::vector<Element> elements_;
     std::size_t size_ = 0;
     std::size_t capacity_ = 0;
 };
