@@ -57,34 +57,39 @@ private:
     [[nodiscard]] bool takeOne(Argument& argument) {
         argument.raw.first = at_;
         argument.raw.last = at_;
-        const TextOutline* outline = nullptr;
-        std::size_t depth = 0;
+        outline_ = nullptr;
+        depth_ = 0;
         for (; at_ < list_.end(); ++at_) {
-            if (at_ == argument.raw.first + kShort && text_.outline().isPlain) {
-                outline = &text_.outline();
-            }
             const TokenKind kind = text_.kind(at_);
-            if (depth == 0 && (kind == COMMA || kind == RIGHT_PARENTHESIS)) {
+            if (depth_ == 0 && (kind == COMMA || kind == RIGHT_PARENTHESIS)) {
                 return true;
             }
-            if (outline == nullptr && !look(argument)) {
+            if (at_ == argument.raw.first + kShort && text_.outline().isPlain) {
+                outline_ = &text_.outline();
+            }
+            if (outline_ == nullptr && !look(argument)) {
                 return false;
             }
-            if (kind == LEFT_PARENTHESIS) {
-                const std::size_t closing = outline == nullptr ? 0 : outline->closing[at_];
-                if (closing > 0 && closing < list_.end()) {
-                    at_ = closing;
-                } else {
-                    ++depth;
-                }
-            } else if (kind == RIGHT_PARENTHESIS) {
-                --depth;
-            }
+            passParenthesis(kind);
             if (kind != WHITESPACE) {
                 argument.raw.last = at_ + 1;
             }
         }
         return false;
+    }
+
+    // Goes from a "(" to its ")" if that is known, or counts.
+    void passParenthesis(TokenKind kind) {
+        if (kind == RIGHT_PARENTHESIS) {
+            --depth_;
+        } else if (kind == LEFT_PARENTHESIS) {
+            const std::size_t closing = outline_ == nullptr ? 0 : outline_->closing[at_];
+            if (closing > 0 && closing < list_.end()) {
+                at_ = closing;
+            } else {
+                ++depth_;
+            }
+        }
     }
 
     // Looks at one token of an argument. Returns false if it is a blank that must be changed.
@@ -99,6 +104,9 @@ private:
     const CppTokenScanner& list_;
     const LexedText& text_;
     std::size_t at_;
+    // Of the argument that is looked through:
+    const TextOutline* outline_ = nullptr;  // once it is asked for, and if it can be trusted
+    std::size_t depth_ = 0;                 // of parentheses open in it
 };
 
 }  // namespace
