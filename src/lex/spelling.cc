@@ -55,14 +55,24 @@ constexpr std::array<TokenKind, 256> kSingles = [] {
 
 // Returns the kind of a punctuator of two characters, or OTHER if these are none.
 [[nodiscard]] TokenKind kindOfPair(char first, char second) noexcept {
+    if (second == '=') {
+        switch (first) {
+        case '=': return EQ;
+        case '!': return NE;
+        case '<': return LE;
+        case '>': return GE;
+        default: return OTHER;
+        }
+    }
+    if (second != first) {
+        return OTHER;
+    }
     switch (first) {
-    case '#': return second == '#' ? PASTE : OTHER;
-    case '|': return second == '|' ? OROR : OTHER;
-    case '&': return second == '&' ? ANDAND : OTHER;
-    case '=': return second == '=' ? EQ : OTHER;
-    case '!': return second == '=' ? NE : OTHER;
-    case '<': return second == '=' ? LE : second == '<' ? LSHIFT : OTHER;
-    case '>': return second == '=' ? GE : second == '>' ? RSHIFT : OTHER;
+    case '#': return PASTE;
+    case '|': return OROR;
+    case '&': return ANDAND;
+    case '<': return LSHIFT;
+    case '>': return RSHIFT;
     default: return OTHER;
     }
 }
