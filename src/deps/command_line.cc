@@ -19,27 +19,15 @@ public:
     // Takes one word, and the next if it is its argument. Returns how many; 0 if that is missing.
     [[nodiscard]] int take(const char* const* words, int count) {
         const std::string_view word = words[0];
-        if (word == "-M" || word == "-MM") {
-            ruleOnly_ = true;
-        } else if (word == "-MD" || word == "-MMD") {
-            besideText_ = true;
-        } else if (word == "-MP") {
-            options_.phonyFiles = true;
-        } else if (word == "--absent") {
-            options_.absent = true;
-        } else if (word == "-h" || word == "--help") {
-            options_.task = DepsOptions::Task::Help;
-        } else if (word == "-v" || word == "--version") {
-            options_.task = DepsOptions::Task::Version;
-        } else if (word == "-MF" || word == "-MT" || word == "-MQ" || word == "-o") {
-            return count > 1 ? takeArgument(word, words[1]) : 0;
-        } else if (word == "-s" && count > 1) {
-            options_.words.insert(options_.words.end(), words, words + 2);
-            return 2;
-        } else {
-            options_.words.push_back(words[0]);
+        if (takeFlag(word)) {
+            return 1;
         }
-        return 1;
+        if (word == "-MF" || word == "-MT" || word == "-MQ" || word == "-o") {
+            return count > 1 ? takeArgument(word, words[1]) : 0;
+        }
+        const int taken = word == "-s" && count > 1 ? 2 : 1;
+        options_.words.insert(options_.words.end(), words, words + taken);
+        return taken;
     }
 
     // As gcc does: with -M the file of -o gets the rule, with -MD the rule goes beside it.
@@ -52,7 +40,7 @@ public:
             options_.ruleName = withSuffix(output, ".d");
         }
         if (!output.empty()) {
-            options_.words.push_back("-o");
+            options_.words.emplace_back("-o");
             options_.words.push_back(output);
             if (options_.targets.empty()) {
                 options_.targets.push_back(escapedTarget(output));
@@ -61,6 +49,31 @@ public:
     }
 
 private:
+    bool takeFlag(std::string_view word) {
+        if (word == "-M" || word == "-MM") {
+            return ruleOnly_ = true;
+        }
+        if (word == "-MD" || word == "-MMD") {
+            return besideText_ = true;
+        }
+        if (word == "-MP") {
+            return options_.phonyFiles = true;
+        }
+        if (word == "--absent") {
+            return options_.absent = true;
+        }
+        return takeText(word);
+    }
+
+    bool takeText(std::string_view word) {
+        const bool isHelp = word == "-h" || word == "--help";
+        if (isHelp || word == "-v" || word == "--version") {
+            options_.task = isHelp ? DepsOptions::Task::Help : DepsOptions::Task::Version;
+            return true;
+        }
+        return false;
+    }
+
     int takeArgument(std::string_view option, const char* argument) {
         if (option == "-MF") {
             options_.ruleName = argument;
@@ -82,7 +95,7 @@ private:
 std::optional<DepsOptions> readDepsOptions(int argc, const char* const* argv, ByteSink& errors) {
     std::optional<DepsOptions> options(std::in_place);
     Reader reader(*options);
-    options->words.push_back(argc > 0 ? argv[0] : "umpre-deps");
+    options->words.emplace_back(argc > 0 ? argv[0] : "umpre-deps");
     for (int at = 1; at < argc;) {
         const int taken = reader.take(argv + at, argc - at);
         if (taken == 0) {
