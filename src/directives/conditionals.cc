@@ -56,11 +56,15 @@ void Conditionals::ifdefDirective(Wanted wanted, std::string_view missingName) {
     if (!isName(name.kind)) {
         reporter_.reportError(missingName);
         sources_.skipToEndOfLine();
-        groups_.decide(false);
+        decide(false);
         return;
     }
-    const bool isDefined = macros_.find(name.text) != nullptr;
-    groups_.decide(isDefined == (wanted == Wanted::Defined));
+    const MacroName* const found = macros_.find(name.text);
+    if (wanted == Wanted::Defined) {
+        decide(found != nullptr);
+    } else {
+        decide(found == nullptr, found);
+    }
     sources_.skipBlanks();
     if (sources_.peek() != NEWLINE) {
         reporter_.reportError(kInvalidCharacters);
@@ -113,7 +117,7 @@ void Conditionals::decideByCondition() {
     if (!ok) {
         sources_.skipToEndOfLine();
     }
-    groups_.decide(ok && value.value != 0);
+    decide(ok && value.value != 0);
     sources_.skipBlanks();
     if (sources_.peek() != END_OF_INPUT) {
         reporter_.reportError(kInvalidCharacters);
@@ -154,7 +158,7 @@ Outcome Conditionals::beginGroup(DirectiveLine& line) {
         return Outcome::Untold;
     }
     groups_.open();
-    groups_.decide(*isTaken);
+    decide(*isTaken, line.word() == KW_IFNDEF ? tested_ : nullptr);
     return Outcome::EndLeft;
 }
 
@@ -166,7 +170,7 @@ Outcome Conditionals::beginBranch(DirectiveLine& line) {
     if (state == GroupState::Seeking) {
         const std::optional<bool> isTaken = condition(line);
         if (isTaken) {
-            groups_.decide(*isTaken);
+            decide(*isTaken);
         }
         return isTaken ? Outcome::EndLeft : Outcome::Untold;
     }
@@ -199,7 +203,8 @@ std::optional<bool> Conditionals::isDefined(DirectiveLine& line) {
     if (!isName(name.kind) || !line.isAtEnd()) {
         return std::nullopt;
     }
-    return macros_.find(name.text) != nullptr;
+    tested_ = macros_.find(name.text);
+    return tested_ != nullptr;
 }
 
 std::optional<bool> Conditionals::isTrue(DirectiveLine& line) {
@@ -215,6 +220,12 @@ std::optional<bool> Conditionals::isTrue(DirectiveLine& line) {
         return std::nullopt;
     }
     return value.value != 0;
+}
+
+void Conditionals::decide(bool taken, const Name* guard) {
+    groups_.decide(taken);
+    ++decisions_;
+    lastGuard_ = guard;
 }
 
 }  // namespace umpre

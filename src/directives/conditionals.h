@@ -2,6 +2,7 @@
 #ifndef UMPRE_DIRECTIVES_CONDITIONALS_H
 #define UMPRE_DIRECTIVES_CONDITIONALS_H
 
+#include <cstddef>
 #include <optional>
 #include <string_view>
 
@@ -41,6 +42,13 @@ public:
     /// Carries out a conditional directive that was read as bytes up to its word.
     [[nodiscard]] DirectiveLine::Outcome carryOut(DirectiveLine& line);
 
+    /// Returns how many conditions were decided so far.
+    [[nodiscard]] std::size_t decisions() const noexcept { return decisions_; }
+
+    /// Returns the name of the `#ifndef` that was decided last, if that name was defined; null
+    /// after any other decision.
+    [[nodiscard]] const Name* lastGuard() const noexcept { return lastGuard_; }
+
     /// A file begins, with no open groups.
     void enterFileGroups() { groups_.enterFile(); }
 
@@ -57,6 +65,7 @@ private:
     void endifDirective();
     [[nodiscard]] bool openGroup();
     void decideByCondition();
+    void decide(bool taken, const Name* guard = nullptr);
 
     // For lines that are read as bytes.
     [[nodiscard]] DirectiveLine::Outcome beginGroup(DirectiveLine& line);
@@ -74,6 +83,9 @@ private:
     ConditionTokens byteTokens_;
     Evaluator<ConditionTokens> byteEvaluator_;
     ConditionalStack groups_;
+    std::size_t decisions_ = 0;
+    const Name* lastGuard_ = nullptr;
+    const Name* tested_ = nullptr;  // by `isDefined`; null if it is not defined
 };
 
 }  // namespace umpre

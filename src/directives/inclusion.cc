@@ -11,46 +11,42 @@ void Inclusion::includeDirective() {
     const std::optional<Operand> operand = readOperand();
     if (operand) {
         sources_.next();  // the line end, so that the file starts on a line of its own
-        openInclude(operand->name, operand->quoted);
+        files_.lookAtClock();
+        files_.open(operand->name, operand->form, files_.find(operand->name, operand->form));
     }
 }
 
-bool Inclusion::openInclude(const std::string& name, bool quoted) {
-    if (quoted && enter(name)) {
-        return true;
+DirectiveLine::Outcome Inclusion::includeDirective(DirectiveLine& line) {
+    const std::string_view text = sources_.currentFile().wholeLines();
+    const std::optional<IncludeOperand> include = lines_.read(line);
+    if (!include) {
+        return DirectiveLine::Outcome::Untold;
     }
-    std::string path;
-    for (const std::string& directory : includeDirectories_) {
-        path.assign(directory).append("/").append(name);
-        if (enter(path)) {
-            return true;
+    line.takeEnd();
+    files_.noteAction();
+    files_.lookAtClock();
+    Search* const search = files_.find(include->name, include->form);
+    lines_.keep(text, *include, search);
+    files_.open(include->name, include->form, search);
+    return DirectiveLine::Outcome::EndTaken;
+}
+
+bool Inclusion::includeLines(CppFileScanner& file) {
+    bool any = false;
+    while (sources_.fileReadNow() == &file) {
+        const IncludeLines::Known* const line = lines_.find(file.wholeLines());
+        if (line == nullptr) {
+            break;
         }
+        if (!any) {
+            files_.lookAtClock();
+        }
+        any = true;
+        file.advance(line->bytes.size(), 1, true);
+        files_.noteAction();
+        files_.open(line->search->name, line->search->form, line->search);
     }
-    reporter_.reportError("Cannot open file: " + name);
-    return false;
-}
-
-bool Inclusion::enter(const std::string& path) {
-    if (!observer_) {
-        return open(path);
-    }
-    const SourcePosition includer = sources_.position();
-    const bool isOpen = open(path);
-    observer_({isOpen ? Event::Kind::FileEntered : Event::Kind::FileMissed, path, includer.fileName,
-               includer.line});
-    return isOpen;
-}
-
-bool Inclusion::open(const std::string& path) {
-    if (!resolver_) {
-        return sources_.pushFile(path);
-    }
-    const IncludeAnswer answer = resolver_(path);
-    if (answer.kind == IncludeAnswer::Kind::Text) {
-        sources_.pushFileText(path, answer.text);
-        return true;
-    }
-    return answer.kind == IncludeAnswer::Kind::Disk && sources_.pushFile(path);
+    return any;
 }
 
 std::optional<Inclusion::Operand> Inclusion::readOperand() {
@@ -75,12 +71,13 @@ std::optional<Inclusion::Operand> Inclusion::readName() {
     sources_.skipBlanks();
     const Token first = sources_.next();
     if (first.kind == STRING_LITERAL) {
-        return Operand{std::string(first.text.substr(1, first.text.size() - 2)), true};
+        return Operand{std::string(first.text.substr(1, first.text.size() - 2)),
+                       IncludeForm::Quotes};
     }
     if (first.kind != LESS) {
         return std::nullopt;
     }
-    Operand operand{{}, false};
+    Operand operand{{}, IncludeForm::Brackets};
     for (Token token = sources_.next(); token.kind != GREATER; token = sources_.next()) {
         if (endsLine(token.kind)) {
             return std::nullopt;

@@ -4,62 +4,58 @@
 
 #include <optional>
 #include <string>
-#include <string_view>
-#include <utility>
-#include <vector>
 
+#include "directives/include_form.h"
+#include "directives/include_lines.h"
+#include "directives/included_files.h"
+#include "lex/cpp_file_scanner.h"
+#include "lex/directive_line.h"
 #include "lex/reporter.h"
 #include "lex/scanner_stack.h"
 #include "lex/text_lexer.h"
 #include "macros/macro_expander.h"
-#include "umpre/event.h"
+#include "macros/macro_table.h"
 
 namespace umpre {
 
-/// `#include` and the search for files.
+/// `#include`: from the line to the name.
 class Inclusion {
 public:
-    Inclusion(ScannerStack& sources, MacroExpander& expander, TextLexer& lexer,
-              Reporter& reporter) noexcept
-        : sources_(sources), expander_(expander), lexer_(lexer), reporter_(reporter) {}
-
-    /// Adds a directory to search, after those added before.
-    void addIncludeDirectory(std::string_view directory) {
-        includeDirectories_.emplace_back(directory);
-    }
-
-    /// Asks before a file is looked for on the disk; nobody, if empty.
-    void setResolver(IncludeResolver resolver) { resolver_ = std::move(resolver); }
-
-    /// Tells which files are entered and which are missed; nobody, if empty.
-    void setObserver(Observer observer) { observer_ = std::move(observer); }
+    Inclusion(ScannerStack& sources, MacroExpander& expander, TextLexer& lexer, MacroTable& macros,
+              IncludedFiles& files, Reporter& reporter) noexcept
+        : sources_(sources),
+          expander_(expander),
+          lexer_(lexer),
+          lines_(macros),
+          files_(files),
+          reporter_(reporter) {}
 
     /// Reads the rest of the line and enters the file that it names. The line end is read only if a
     /// file is named.
     void includeDirective();
 
-    /// Looks for a file and enters it: a quoted name as it is first, then any name in the include
-    /// directories. Returns false after reporting that it is nowhere.
-    bool openInclude(const std::string& name, bool quoted);
+    /// Does the same for a line that was read as bytes up to its word.
+    [[nodiscard]] DirectiveLine::Outcome includeDirective(DirectiveLine& line);
+
+    /// Does the same for lines of a file that are known from their bytes, from a line's start, up
+    /// to one that enters a file. Returns whether there were any.
+    [[nodiscard]] bool includeLines(CppFileScanner& file);
 
 private:
     struct Operand {
         std::string name;
-        bool quoted;
+        IncludeForm form;
     };
 
-    [[nodiscard]] bool enter(const std::string& path);
-    [[nodiscard]] bool open(const std::string& path);
     [[nodiscard]] std::optional<Operand> readOperand();
     [[nodiscard]] std::optional<Operand> readName();
 
     ScannerStack& sources_;
     MacroExpander& expander_;
     TextLexer& lexer_;
+    IncludeLines lines_;
+    IncludedFiles& files_;
     Reporter& reporter_;
-    std::vector<std::string> includeDirectories_;
-    IncludeResolver resolver_;
-    Observer observer_;
 };
 
 }  // namespace umpre

@@ -25,6 +25,10 @@ bool OutputFile::write(std::string_view bytes) {
     return !failed_;
 }
 
+std::optional<FileIdentity> OutputFile::target() const {
+    return DescriptorSink(descriptor_).target();
+}
+
 bool OutputFile::close() {
     if (descriptor_ >= 0) {
         failed_ = ::close(descriptor_) != 0 || failed_;

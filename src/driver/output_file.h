@@ -24,6 +24,7 @@ public:
     /// it cannot be opened.
     [[nodiscard]] bool open(const std::string& name);
     [[nodiscard]] bool write(std::string_view bytes) override;
+    [[nodiscard]] std::optional<FileIdentity> target() const override;
     /// Closes the output. Returns whether everything written has arrived.
     [[nodiscard]] bool close();
     /// Returns what to say when something has not.

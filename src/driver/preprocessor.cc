@@ -21,7 +21,8 @@ Preprocessor::Preprocessor(DiagnosticSink diagnostics, const RunOptions& options
       expander_(sources_, macros_, diagnostics_, lexer_),
       conditionals_(sources_, macros_, expander_, lexer_, diagnostics_),
       definitions_(sources_, macros_, diagnostics_),
-      inclusion_(sources_, expander_, lexer_, diagnostics_),
+      files_(sources_, output_, conditionals_, diagnostics_, options),
+      inclusion_(sources_, expander_, lexer_, macros_, files_, diagnostics_),
       lineControl_(sources_, expander_, lexer_, output_, diagnostics_),
       textReader_(output_, macros_.filter()),
       lineSkipper_(output_) {
@@ -79,8 +80,8 @@ RunResult Preprocessor::readAll() {
     return diagnostics_.errorFlag() ? RunResult::Errors : RunResult::Clean;
 }
 
-// Reads lines as bytes and finishes the line that this stops in, if any. Returns false, at the
-// start of a line, when that line wants tokens.
+// Reads lines as bytes, finishes the line that this stops in, if any, and leaves a file that has
+// ended. Returns false, at the start of a line, when that line wants tokens.
 bool Preprocessor::readBytes() {
     CppFileScanner* const file = byteSource();
     if (file == nullptr || output_.failed()) {
@@ -94,7 +95,7 @@ bool Preprocessor::readBytes() {
     } else {
         const Stop stop = textReader_.copyText(*file, Stop::LineStart);
         if (stop == Stop::LineStart) {
-            return readDirective(*file);
+            return inclusion_.includeLines(*file) || readDirective(*file);
         }
         if (stop == Stop::Name) {
             writeToken(textReader_.name());
@@ -113,24 +114,34 @@ bool Preprocessor::readDirective(CppFileScanner& file) {
         line.takeEnd();
         output_.endLine();
     }
-    return outcome != DirectiveLine::Outcome::Untold;
+    return outcome != DirectiveLine::Outcome::Untold || sources_.leaveEndedFile();
 }
 
 DirectiveLine::Outcome Preprocessor::carryOut(DirectiveLine& line) {
     const TokenKind word = line.word();
     const bool isConditional = word >= KW_IF && word <= KW_ENDIF;
     if (isConditional) {
-        return conditionals_.carryOut(line);
+        return carryOutConditional(line);
     }
     if (conditionals_.skipping()) {
         return isName(word) && line.skipRest() ? DirectiveLine::Outcome::EndLeft
                                                : DirectiveLine::Outcome::Untold;
     }
     switch (word) {
-    case KW_DEFINE: return definitions_.defineDirective(line);
-    case KW_UNDEF: return definitions_.undefDirective(line);
+    case KW_INCLUDE: return inclusion_.includeDirective(line);
+    case KW_DEFINE: files_.noteAction(); return definitions_.defineDirective(line);
+    case KW_UNDEF: files_.noteAction(); return definitions_.undefDirective(line);
     default: return DirectiveLine::Outcome::Untold;
     }
+}
+
+DirectiveLine::Outcome Preprocessor::carryOutConditional(DirectiveLine& line) {
+    const bool isActive = !conditionals_.skipping();
+    const DirectiveLine::Outcome outcome = conditionals_.carryOut(line);
+    if (isActive && outcome != DirectiveLine::Outcome::Untold) {
+        files_.noteAction();
+    }
+    return outcome;
 }
 
 // Returns the file that can be read as bytes now, or null.
@@ -154,6 +165,9 @@ void Preprocessor::line() {
 
 // A word that stands for no conditional directive is looked at in active text only.
 void Preprocessor::directiveLine() {
+    if (!conditionals_.skipping()) {
+        files_.noteAction();
+    }
     sources_.skipBlanks();
     const TokenKind word = sources_.next().kind;
     if (conditionals_.carryOut(word)) {
@@ -183,6 +197,7 @@ void Preprocessor::activeDirective(TokenKind word) {
 }
 
 void Preprocessor::textLine(std::string_view blanks, Token first) {
+    files_.noteAction();
     output_.syncTo(sources_.position());
     output_.write(blanks);
     if (first.kind != END_OF_INPUT) {
@@ -192,6 +207,7 @@ void Preprocessor::textLine(std::string_view blanks, Token first) {
 }
 
 void Preprocessor::restOfTextLine() {
+    files_.noteAction();
     while (!output_.failed()) {
         CppFileScanner* const file = byteSource();
         const Stop stop =
@@ -245,6 +261,7 @@ void Preprocessor::fileEntered() {
 
 void Preprocessor::fileEnds() {
     conditionals_.closeFileGroups();
+    files_.fileEnds();
 }
 
 void Preprocessor::fileResumed() {

@@ -8,6 +8,7 @@
 
 #include "directives/conditionals.h"
 #include "directives/definitions.h"
+#include "directives/included_files.h"
 #include "directives/inclusion.h"
 #include "directives/line_control.h"
 #include "driver/diagnostics.h"
@@ -46,17 +47,15 @@ public:
     }
 
     /// Adds a directory to search for included files, after those added before.
-    void addIncludeDirectory(std::string_view directory) {
-        inclusion_.addIncludeDirectory(directory);
-    }
+    void addIncludeDirectory(std::string_view directory) { files_.addDirectory(directory); }
 
     /// Asks before an included file is looked for on the disk.
-    void setResolver(IncludeResolver resolver) { inclusion_.setResolver(std::move(resolver)); }
+    void setResolver(IncludeResolver resolver) { files_.setResolver(std::move(resolver)); }
 
     /// Tells what the run does.
     void setObserver(const Observer& observer) {
         observer_ = observer;
-        inclusion_.setObserver(observer);
+        files_.setObserver(observer);
     }
 
     /// Sets where the output goes; must be called before a source is opened.
@@ -84,6 +83,7 @@ private:
     [[nodiscard]] bool readBytes();
     [[nodiscard]] bool readDirective(CppFileScanner& file);
     [[nodiscard]] DirectiveLine::Outcome carryOut(DirectiveLine& line);
+    [[nodiscard]] DirectiveLine::Outcome carryOutConditional(DirectiveLine& line);
     [[nodiscard]] CppFileScanner* byteSource();
     void line();
     void directiveLine();
@@ -103,6 +103,7 @@ private:
     MacroExpander expander_;
     Conditionals conditionals_;
     Definitions definitions_;
+    IncludedFiles files_;
     Inclusion inclusion_;
     LineControl lineControl_;
     TextReader textReader_;

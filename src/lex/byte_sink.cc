@@ -18,4 +18,17 @@ bool DescriptorSink::write(std::string_view bytes) {
     return true;
 }
 
+std::optional<FileIdentity> DescriptorSink::target() const {
+    struct stat status {};
+
+    if (::fstat(descriptor_, &status) != 0) {
+        return std::nullopt;
+    }
+    const bool isDevice = S_ISCHR(status.st_mode) && ::isatty(descriptor_) == 0;
+    if (!S_ISREG(status.st_mode) && !isDevice) {
+        return std::nullopt;
+    }
+    return identityOf(status);
+}
+
 }  // namespace umpre

@@ -2,7 +2,10 @@
 #ifndef UMPRE_LEX_BYTE_SINK_H
 #define UMPRE_LEX_BYTE_SINK_H
 
+#include <optional>
 #include <string_view>
+
+#include "lex/file_identity.h"
 
 namespace umpre {
 
@@ -12,6 +15,10 @@ public:
     virtual ~ByteSink() = default;
     /// Takes all the bytes. Returns false if some could not be written.
     [[nodiscard]] virtual bool write(std::string_view bytes) = 0;
+
+    /// Returns what the bytes are written to if nobody can keep the writer waiting there, as with a
+    /// regular file.
+    [[nodiscard]] virtual std::optional<FileIdentity> target() const { return std::nullopt; }
 };
 
 /// Writes to a borrowed file descriptor, going on after interruptions and short writes.
@@ -20,6 +27,7 @@ public:
     explicit DescriptorSink(int descriptor) noexcept : descriptor_(descriptor) {}
 
     [[nodiscard]] bool write(std::string_view bytes) override;
+    [[nodiscard]] std::optional<FileIdentity> target() const override;
 
 private:
     int descriptor_;

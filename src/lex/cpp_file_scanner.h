@@ -50,8 +50,20 @@ public:
         return hasPeek() ? std::string_view{} : lexer_.wholeLines();
     }
 
+    /// Tells whether nothing but END_OF_INPUT is left to be read.
+    [[nodiscard]] bool isAtEnd() { return !hasPeek() && lastWasNewline_ && bytesAhead().empty(); }
+
     /// Returns the size of the literal that begins at this place of `wholeLines()`, or 0.
     [[nodiscard]] std::size_t literalSize(const char* quote) { return lexer_.literalSize(quote); }
+
+    /// Returns what a regular file was when it was opened; all zeros for anything else.
+    [[nodiscard]] const FileIdentity& identity() const noexcept { return input_.identity(); }
+
+    /// Tells whether a regular file was read to its end and was as long as its size said.
+    [[nodiscard]] bool isReadWhole() const noexcept { return input_.isReadWhole(); }
+
+    /// Returns how often bytes were waited for since this was last asked.
+    [[nodiscard]] std::size_t takeWaits() noexcept { return input_.takeWaits(); }
 
     /// Returns the finder of literals among the bytes ahead.
     [[nodiscard]] LiteralFinder& literals() noexcept { return lexer_.literals(); }

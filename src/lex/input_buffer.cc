@@ -65,9 +65,12 @@ bool InputBuffer::openFile(const std::string& name) {
     }
     openBorrowed(descriptor);
     owned_ = true;
-    if (S_ISREG(status.st_mode)) {
+    mayWait_ = !S_ISREG(status.st_mode);
+    waits_ += mayWait_ ? 1 : 0;
+    if (!mayWait_) {
         // A size of 0 may just not be told. What such a file holds is read before anything can be
         // added to it.
+        identity_ = identityOf(status);
         sizeKnown_ = status.st_size > 0;
         readAtOnce_ = !sizeKnown_;
         unread_ = static_cast<std::uint64_t>(status.st_size);
@@ -78,6 +81,7 @@ bool InputBuffer::openFile(const std::string& name) {
 void InputBuffer::openBorrowed(int descriptor) {
     close();
     descriptor_ = descriptor;
+    mayWait_ = true;
     ended_ = false;
 }
 
@@ -109,6 +113,7 @@ void InputBuffer::reset() {
     readAtOnce_ = false;
     sizeKnown_ = false;
     unread_ = 0;
+    identity_ = {};
 }
 
 bool InputBuffer::refill(char*& position, Need need) {
@@ -183,6 +188,7 @@ void InputBuffer::readOnce() {
         throw ScannerFailure{"input in flex scanner failed"};
     }
     filled_ += static_cast<std::size_t>(count);
+    waits_ += mayWait_ ? 1 : 0;
     if (sizeKnown_) {
         unread_ -= static_cast<std::uint64_t>(count);
     }

@@ -7,6 +7,9 @@
 #include <memory>
 #include <string>
 #include <string_view>
+#include <utility>
+
+#include "lex/file_identity.h"
 
 #include "lex/run_options.h"
 
@@ -60,6 +63,15 @@ public:
     /// if nothing is left there. Throws ScannerFailure if reading fails.
     [[nodiscard]] bool refill(char*& position, Need need);
 
+    /// Returns what a regular file was when it was opened; all zeros for anything else.
+    [[nodiscard]] const FileIdentity& identity() const noexcept { return identity_; }
+
+    /// Tells whether a regular file was read to its end and was as long as its size said.
+    [[nodiscard]] bool isReadWhole() const noexcept { return sizeKnown_ && unread_ == 0; }
+
+    /// Returns how often bytes were waited for since this was last asked.
+    [[nodiscard]] std::size_t takeWaits() noexcept { return std::exchange(waits_, 0); }
+
 private:
     void reset();
     void reserve(std::size_t capacity);
@@ -85,6 +97,9 @@ private:
     bool readAtOnce_ = false;  // in the first refill
     bool sizeKnown_ = false;
     std::uint64_t unread_ = 0;  // of a regular file
+    FileIdentity identity_;
+    bool mayWait_ = false;  // for somebody else to write
+    std::size_t waits_ = 0;
 };
 
 }  // namespace umpre

@@ -50,6 +50,9 @@ public:
 
     void add(std::string_view name);
 
+    /// Returns how many names were added.
+    [[nodiscard]] std::size_t size() const noexcept { return hashes_.size(); }
+
     /// Returns false only if the name was never added.
     [[nodiscard]] bool mayHold(std::string_view name) const noexcept {
         std::array<char, kChunk> bytes{};

@@ -2,16 +2,41 @@
 #include "lex/output_writer.h"
 
 #include <algorithm>
-#include <array>
 #include <charconv>
 #include <cstring>
 
 namespace umpre {
+namespace {
+
+// The most that a marker takes without its name.
+constexpr std::size_t kMarkerSize = 24;
+
+[[nodiscard]] char* put(char* at, std::string_view text) noexcept {
+    return at + text.copy(at, text.size());
+}
+
+// Writes a marker into memory that is large enough. Returns its end.
+[[nodiscard]] char* putMarker(char* at, const SourcePosition& position) noexcept {
+    at = put(at, "#line ");
+    at = std::to_chars(at, at + kMarkerSize, position.line).ptr;
+    at = put(at, " \"");
+    std::string_view name = position.fileName;
+    for (std::size_t end = name.find('\\'); end != std::string_view::npos; end = name.find('\\')) {
+        at = put(at, name.substr(0, end + 1));
+        *at++ = '\\';
+        name.remove_prefix(end + 1);
+    }
+    at = put(at, name);
+    return put(at, "\"\n");
+}
+
+}  // namespace
 
 OutputWriter::OutputWriter() : block_(kBlockSize) {}
 
 void OutputWriter::redirect(ByteSink& sink) {
     sink_ = &sink;
+    target_ = sink.target();
 }
 
 void OutputWriter::writeLineFeeds(std::size_t count) {
@@ -27,20 +52,21 @@ void OutputWriter::writeLineFeeds(std::size_t count) {
 }
 
 void OutputWriter::writeLineMarker(const SourcePosition& position) {
-    std::array<char, 16> number{};
-    const char* const end = std::to_chars(number.begin(), number.end(), position.line).ptr;
-    write("#line ");
-    write({number.data(), static_cast<std::size_t>(end - number.data())});
-    write(" \"");
-    std::string_view name = position.fileName;
-    for (std::size_t at = name.find('\\'); at != std::string_view::npos; at = name.find('\\')) {
-        write(name.substr(0, at + 1));
-        write("\\");
-        name.remove_prefix(at + 1);
-    }
-    write(name);
-    write("\"\n");
     outputLine_ = position.line;
+    // Every byte of the name may be doubled.
+    const std::size_t size = kMarkerSize + 2 * position.fileName.size();
+    if (size > kBlockSize - used_) {
+        write(markerOf(position));
+        return;
+    }
+    char* const begin = block_.data() + used_;
+    used_ += static_cast<std::size_t>(putMarker(begin, position) - begin);
+}
+
+std::string OutputWriter::markerOf(const SourcePosition& position) {
+    std::string marker(kMarkerSize + 2 * position.fileName.size(), '\0');
+    marker.resize(static_cast<std::size_t>(putMarker(marker.data(), position) - marker.data()));
+    return marker;
 }
 
 void OutputWriter::flush() {
@@ -57,7 +83,19 @@ void OutputWriter::writeLarge(std::string_view text) {
     write(text);
 }
 
+std::optional<std::size_t> OutputWriter::lineFeedsSince(Place place) const {
+    if (place.block != blocks_) {
+        return std::nullopt;
+    }
+    const std::string_view written(block_.data() + place.at, used_ - place.at);
+    if (written.find_first_not_of('\n') != std::string_view::npos) {
+        return std::nullopt;
+    }
+    return written.size();
+}
+
 void OutputWriter::handOver(std::string_view text) {
+    ++blocks_;
     if (!failed_ && !text.empty()) {
         failed_ = sink_ == nullptr || !sink_->write(text);
     }

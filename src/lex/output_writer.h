@@ -4,6 +4,8 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <optional>
+#include <string>
 #include <string_view>
 #include <vector>
 
@@ -61,8 +63,29 @@ public:
     /// Writes `#line N "name"` with every backslash of the name doubled, and counts from there.
     void writeLineMarker(const SourcePosition& position);
 
+    /// Returns the marker of a position.
+    [[nodiscard]] static std::string markerOf(const SourcePosition& position);
+
     /// Hands everything written to the sink.
     void flush();
+
+    /// A place in the output.
+    struct Place {
+        std::size_t block;
+        std::size_t at;
+    };
+
+    [[nodiscard]] Place place() const noexcept { return {blocks_, used_}; }
+
+    /// Returns how many line feeds were written since this place was taken; nothing if something
+    /// else was, or if some of it has been handed over.
+    [[nodiscard]] std::optional<std::size_t> lineFeedsSince(Place place) const;
+
+    /// Returns what the sink writes to, as it says.
+    [[nodiscard]] const std::optional<FileIdentity>& target() const noexcept { return target_; }
+
+    /// Returns how often somebody else may have kept the sink waiting.
+    [[nodiscard]] std::size_t waits() const noexcept { return target_ ? 0 : blocks_; }
 
     /// Tells whether something could not be written.
     [[nodiscard]] bool failed() const noexcept { return failed_; }
@@ -75,6 +98,8 @@ private:
 
     std::vector<char> block_;
     std::size_t used_ = 0;
+    std::size_t blocks_ = 0;  // handed over
+    std::optional<FileIdentity> target_;
     ByteSink* sink_ = nullptr;
     std::int32_t outputLine_ = 0;
     bool failed_ = false;

@@ -3,6 +3,8 @@
 #define UMPRE_LEX_RUN_OPTIONS_H
 
 #include <cstddef>
+#include <cstdint>
+#include <limits>
 
 namespace umpre {
 
@@ -11,6 +13,9 @@ namespace umpre {
 struct RunOptions {
     bool plainRoad = false;                           ///< every shortcut past the scanner is off
     std::size_t windowSize = std::size_t{64} * 1024;  ///< bytes of input held at a time, about
+    /// For so many nanoseconds after its last change, a file is not told apart by its times.
+    std::int64_t settlingTime = 20'000'000;
+    static constexpr std::int64_t kAlwaysSettled = std::numeric_limits<std::int64_t>::min();
 };
 
 }  // namespace umpre

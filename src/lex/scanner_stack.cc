@@ -10,6 +10,7 @@
 // place, so that nothing below is popped into, and lowered again afterwards.
 #include "lex/scanner_stack.h"
 
+#include <algorithm>
 #include <cassert>
 #include <utility>
 
@@ -45,6 +46,15 @@ Token ScannerStack::nextBelow() {
     return token;
 }
 
+bool ScannerStack::leaveEndedFile() {
+    CppFileScanner* const file = fileReadNow();
+    if (file == nullptr || atFloor() || !file->isAtEnd()) {
+        return false;
+    }
+    pop();
+    return true;
+}
+
 void ScannerStack::pop() {
     const bool isFile = currentSource_->isFile();
     if (isFile) {
@@ -62,6 +72,7 @@ void ScannerStack::dropCurrent() {
     assert(!sources_.empty());
     currentSource_ = sources_.back().scanner;
     if (isFile) {
+        waits_ += files_.back()->takeWaits();
         files_.back()->close();
         if (spareFiles_.size() < kSpares) {
             spareFiles_.push_back(std::move(files_.back()));
@@ -105,6 +116,7 @@ bool ScannerStack::pushFile(const std::string& fileName, std::string_view messag
         file->setFileName(messageName);
     }
     enter(std::move(file));
+    mostFiles_ = std::max(mostFiles_, files_.size());
     return true;
 }
 

@@ -116,6 +116,20 @@ public:
     /// Tells whether every token must be read by itself.
     [[nodiscard]] bool plainRoad() const noexcept { return options_.plainRoad; }
 
+    /// Leaves the current file, as reading on would, if it is an included one and read to its end.
+    /// Returns whether it was. The token behind is not looked at.
+    bool leaveEndedFile();
+
+    /// Returns how often bytes were waited for so far. While a program waits, others may change
+    /// files.
+    [[nodiscard]] std::size_t waits() noexcept {
+        waits_ += files_.back()->takeWaits();
+        return waits_;
+    }
+
+    /// Tells whether so many files have been open at a time that one more can be opened now.
+    [[nodiscard]] bool canOpenOneMore() const noexcept { return files_.size() < mostFiles_; }
+
     /// Does what reading a token of a text does beside yielding it.
     void carryOutEffects(const LexedText& text, std::size_t index) {
         text.carryOutEffects(index, *this);
@@ -168,6 +182,8 @@ private:
     std::size_t floor_ = 1;
     std::vector<std::size_t> savedFloors_;
     std::size_t commentEffects_ = 0;
+    std::size_t waits_ = 0;
+    std::size_t mostFiles_ = 0;  // open at a time
 };
 
 }  // namespace umpre

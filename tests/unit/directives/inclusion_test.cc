@@ -27,13 +27,35 @@ struct InclusionFixture {
         directory.write("two/b.h", "b\n");
     }
 
-    void search(std::string_view folder) {
-        inclusion.addIncludeDirectory(directory.nameOf(folder));
+    void search(std::string_view folder) { files.addDirectory(directory.nameOf(folder)); }
+
+    // Reads a line as bytes. Returns false if it was left to the scanner.
+    [[nodiscard]] bool includeLine() {
+        CppFileScanner& file = f.sources.currentFile();
+        if (inclusion.includeLines(file)) {
+            return true;
+        }
+        DirectiveLine line(file);
+        return line.word() == TokenKind::KW_INCLUDE
+               && inclusion.includeDirective(line) == DirectiveLine::Outcome::EndTaken;
+    }
+
+    // Reads the file that was entered.
+    void readFile() {
+        while (!f.sources.leaveEndedFile()) {
+            (void)f.sources.next();
+        }
     }
 
     TemporaryDirectory directory;
     DirectiveFixture f;
-    Inclusion inclusion{f.sources, f.expander, f.lexer, f.reporter};
+    Conditionals conditionals{f.sources, f.macros, f.expander, f.lexer, f.reporter};
+    IncludedFiles files{f.sources,
+                        f.output,
+                        conditionals,
+                        f.reporter,
+                        {.settlingTime = RunOptions::kAlwaysSettled}};
+    Inclusion inclusion{f.sources, f.expander, f.lexer, f.macros, files, f.reporter};
 };
 
 TEST(Inclusion, ReadsAFileFromTheFirstDirectoryThatHasIt) {
@@ -188,27 +210,97 @@ TEST(Inclusion, AllowsACommentBehindTheName) {
     EXPECT_EQ(i.f.rest(), "b\nrest\n");
 }
 
-TEST(Inclusion, OpensAFileWhenAsked) {
-    InclusionFixture i("rest\n");
+TEST(Inclusion, ReadsWholeLinesAsBytes) {
+    InclusionFixture i("#include <a.h>\n# include\"b.h\" \n\t#\tinclude<b.h>\nrest\n");
+    i.search("one");
     i.search("two");
-    EXPECT_TRUE(i.inclusion.openInclude("b.h", false));
-    EXPECT_EQ(i.f.rest(), "b\nrest\n");
+    EXPECT_TRUE(i.includeLine());
+    EXPECT_EQ(i.f.sources.position().fileName, i.directory.nameOf("one/a.h"));
+    EXPECT_EQ(i.f.rest(), "in one\n# include\"b.h\" \n\t#\tinclude<b.h>\nrest\n");
 }
 
-TEST(Inclusion, SaysThatItCouldNotOpenAFile) {
-    InclusionFixture i("rest\n");
-    i.search("two");
-    EXPECT_FALSE(i.inclusion.openInclude("none.h", true));
-    EXPECT_EQ(i.f.reporter.report(), "Cannot open file: none.h");
-    EXPECT_EQ(i.f.rest(), "rest\n");
+TEST(Inclusion, ReadsCommentsAndContinuationsAsBytes) {
+    for (const std::string_view line : {
+             "#include <a.h> // c\n",
+             "# /* c */ include /* c */ <a.h> /* c */\n",
+             "#\\\ninclude \\\n <a.h> \\\n\n",
+         }) {
+        InclusionFixture i(std::string(line) + "rest\n");
+        i.search("one");
+        EXPECT_TRUE(i.includeLine()) << line;
+        EXPECT_EQ(i.f.rest(), "in one\nrest\n") << line;
+    }
 }
 
-TEST(Inclusion, ANameWithAZeroByteOpensNothing) {
-    InclusionFixture i("rest\n");
+TEST(Inclusion, ReportsAtTheSameLineHoweverItReads) {
+    for (const bool asBytes : {false, true}) {
+        InclusionFixture i("#include <none.h>\nrest\n");
+        if (asBytes) {
+            EXPECT_TRUE(i.includeLine());
+        } else {
+            (void)i.f.readWord();
+            i.inclusion.includeDirective();
+        }
+        EXPECT_EQ(i.f.reporter.report(), "Cannot open file: none.h");
+        EXPECT_EQ(i.f.sources.position().line, 2);
+        EXPECT_EQ(i.f.rest(), "rest\n");
+    }
+}
+
+TEST(Inclusion, LeavesLinesToTheScannerThatItMayReadDifferently) {
+    for (const std::string_view line : {
+             "",
+             "\n",
+             "rest",
+             "#include",
+             "#include\n",
+             "#include \n",
+             "#include \"a.h\"",
+             "#include <a.h>",
+             "#include <a.h> \\\n",
+             "#include \"a.h\"\r\n",
+             "#include <a.h>\r",
+             "#include \"a.h\" x\n",
+             "#include <a.h> /* x\n*/\n",
+             "#include <a.h\n",
+             "#include \"a.h\n\"\n",
+             "#include \"\"\n",
+             "#include <>\n",
+             "#include \"a\\b.h\"\n",
+             "#include <a b.h>\n",
+             "#include <a//b.h>\n",
+             "#include <a/*b.h>\n",
+             "#include <=a.h>\n",
+             "#include <'a.h>\n",
+             "#include <MACRO>\n",
+             "#include <1MACRO>\n",
+             "#include MACRO\n",
+             "#included <a.h>\n",
+             "#Include <a.h>\n",
+             "include <a.h>\n",
+             "##include <a.h>\n",
+         }) {
+        InclusionFixture i(line);
+        i.search("one");
+        i.f.define("MACRO", "a.h");
+        EXPECT_FALSE(i.includeLine()) << line;
+        EXPECT_EQ(i.f.reporter.report(), "") << line;
+        EXPECT_EQ(i.f.sources.position().fileName, "main") << line;
+    }
+}
+
+TEST(Inclusion, LooksAgainAtALineWhoseNameBecameAMacro) {
+    InclusionFixture i("#include <a.h>\n#include <a.h>\n#include <a.h>\n#include <a.h>\n");
+    i.search("one");
     i.search("two");
-    const std::string name("b.h\0", 4);
-    EXPECT_FALSE(i.inclusion.openInclude(name, true));
-    EXPECT_EQ(i.f.reporter.report(), "Cannot open file: " + name);
+    i.directory.write("one/a.h", "#ifndef GUARD\n#endif\n");
+    i.f.define("GUARD", "");
+    for (int times = 0; times < 3; ++times) {
+        EXPECT_TRUE(i.includeLine());
+        i.readFile();
+    }
+    i.f.define("a", "b");
+    EXPECT_FALSE(i.includeLine());
 }
 
 }  // namespace

@@ -90,7 +90,7 @@ void expectSameOnAllRoads(std::string_view text) {
     const Outcome expected = plainOutcome(text);
     for (const bool plainRoad : {true, false}) {
         for (const std::size_t windowSize : kWindowSizes) {
-            const RunOptions options{plainRoad, windowSize};
+            const RunOptions options{plainRoad, windowSize, RunOptions::kAlwaysSettled};
             EXPECT_EQ(fileOutcome(fileName, options), expected)
                 << ::testing::PrintToString(text) << ", plain road " << plainRoad << ", window "
                 << windowSize;
@@ -110,6 +110,23 @@ void expectSameOnAllRoads(const std::vector<std::string>& texts) {
         expectSameOnAllRoads(std::string("#if 0\n").append(text).append("\n#else\nN\n#endif\nend"));
         expectSameOnAllRoads(std::string_view(defined).substr(0, defined.size() - 1));
     }
+}
+
+// A file that is included again and again, with the macro G defined and not, from files and from
+// another included file.
+void expectSameOnAllRoadsIncludedAgain(std::string_view text) {
+    const testing::TemporaryDirectory directory;
+    const std::string include = "#include \"" + directory.write("a.h", text) + "\"\n";
+    const std::string outer = "#include \"" + directory.write("b.h", include + include) + "\"\n";
+    const std::string twice = include + include;
+    expectSameOnAllRoads(std::string(kMacros)
+                             .append(twice)
+                             .append("N __LINE__\n")
+                             .append(twice + outer + "G\n")
+                             .append("#undef G\n#define U\n")
+                             .append(twice + twice + "#undef U\n" + outer)
+                             .append("#define G\n#undef EMPTY\n" + outer + twice)
+                             .append("#if 0\n" + include + "#endif\n  " + include + "N"));
 }
 
 TEST(Roads, WriteWhatIsExpected) {
@@ -599,6 +616,59 @@ TEST(Roads, AgreeOnIncludedFiles) {
         "#include \"" + directory.nameOf("none.h") + "\"\nN\n",
         "#include <none.h\nN\n#include\nN\n#include N\nN\n",
     });
+}
+
+// Files that a defined name makes empty, and files that only look so.
+TEST(Roads, AgreeOnFilesIncludedAgain) {
+    for (const std::string_view text : {
+             "#ifndef G\n#define G\ntext N\n#endif\n",
+             "\n/* a\nb */\n\n#ifndef G\n#define G\n#define M \\\n 1\n#endif\n\n// end\n",
+             "#ifndef G\n#define G\n#endif",
+             "#ifndef G // why\n#define G\n#endif /* G\n */\n",
+             "  #  ifndef  G\n#define G\n  #  endif\n",
+             "text\n#ifndef G\n#define G\n#endif\n",
+             "EMPTY\n#ifndef G\n#define G\n#endif\n",
+             "#ifndef G\n#define G\n#endif\nEMPTY\n",
+             "#ifndef G\n#define G\n#endif N\n",
+             "#ifndef G\n#define G\n#endif\ntext\n",
+             "#undef U X\n#ifndef G\n#define G\n#endif\n",
+             "#define N 4\n#ifndef G\n#define G\n#endif\n",
+             "#ifndef G\n#define G\n#endif\n#undef G\n",
+             "#ifndef G\n#define G\n#endif\n#undef EMPTY\n",
+             "#ifndef G\n#define G\n#endif\n#\n",
+             "#\n#ifndef G\n#define G\n#endif\n",
+             "#ifndef G\n#define G\n#else\n#endif\n",
+             "#ifndef G\n#define G\n#else\nagain\n#endif\n",
+             "#ifndef G\n#define G\n#elif defined U\nagain\n#endif\n",
+             "#ifndef G\n#define G\n#elif 0\n#endif\n",
+             "#ifndef G\n#define G\n#if 1\n#else\n#else\n#endif\n#endif\n",
+             "#ifndef G\n#define G\n#if 1\n#elif\n#else\n#endif\n#endif\n",
+             "#ifndef G\n#define G\n#endif\n#ifndef G\n#endif\n",
+             "#ifndef G\n#define G\n#endif\n#if 0\n#endif\n",
+             "#if 0\n#endif\n#ifndef G\n#define G\n#endif\n",
+             "#ifndef G\n#ifndef H\n#define G\n#endif\n#endif\n",
+             "#if !defined G\n#define G\n#endif\n",
+             "#ifdef G\n#else\n#define G\n#endif\n",
+             "#ifndef G x\n#define G\n#endif\n",
+             "#ifndef\n#define G\n#endif\n",
+             "#ifndef 1\n#define G\n#endif\n",
+             "#ifndef G\n#define G\n",
+             "#ifndef G\n#define G\n#endif\n#endif\n",
+             "#ifndef G\n#define G\n#endif\n/* no end\n",
+             "#ifndef G\n#define G\n/* no end\n",
+             "#ifndef G\n#define G\n#endif\n#line 7 \"other\"\n",
+             "#ifndef G\n#define G\n#endif\n#pragma N\n",
+             "#ifndef G\n#define G\n#endif\n#error N\n",
+             "#ifndef G\r\n#define G\r\n#endif\r\n",
+             "#ifndef G\n#define G\n\"N\n'\n#endif\n",
+             "#ifndef G\n#define G\n#\n\n#endif\n",
+             "#ifndef G\n#\n#endif\n#endif\n",
+             "#ifndef G\n#define G\n#endif\n#include \"none.h\"\n",
+             "__LINE__ __FILE__\n#undef __LINE__\n",
+             "N\n#undef N\n",
+         }) {
+        expectSameOnAllRoadsIncludedAgain(text);
+    }
 }
 
 }  // namespace

@@ -385,5 +385,44 @@ TEST(ScannerStack, CarriesOutTheEffectsOfATextThatItDoesNotRead) {
     EXPECT_EQ(f.reporter.report(), "3: unterminated comment");
 }
 
+TEST(ScannerStack, LeavesAFileThatIsReadToItsEnd) {
+    const testing::TemporaryDirectory directory;
+    testing::SourceFixture f("rest\n");
+    const std::string name = directory.write("a.h", "x\n");
+    ASSERT_TRUE(f.sources.pushFile(name));
+    EXPECT_FALSE(f.sources.leaveEndedFile());
+    (void)f.sources.next();
+    EXPECT_FALSE(f.sources.leaveEndedFile());
+    (void)f.sources.next();
+    EXPECT_TRUE(f.sources.leaveEndedFile());
+    EXPECT_EQ(f.fileEvents.events(), "+main +" + name + " -" + name + " =main");
+    EXPECT_EQ(f.rest(), "rest\n");
+    EXPECT_FALSE(f.sources.leaveEndedFile());
+}
+
+TEST(ScannerStack, LeavesAFileOnlyBehindItsLastLineEnd) {
+    const testing::TemporaryDirectory directory;
+    testing::SourceFixture f("rest\n");
+    ASSERT_TRUE(f.sources.pushFile(directory.write("a.h", "x")));
+    (void)f.sources.next();
+    EXPECT_FALSE(f.sources.leaveEndedFile());
+    EXPECT_EQ(f.sources.next().kind, TokenKind::NEWLINE);
+    EXPECT_TRUE(f.sources.leaveEndedFile());
+}
+
+TEST(ScannerStack, CanOpenAsManyFilesAsWereOpen) {
+    const testing::TemporaryDirectory directory;
+    const std::string name = directory.write("a.h", "");
+    testing::SourceFixture f("rest\n");
+    EXPECT_FALSE(f.sources.canOpenOneMore());
+    ASSERT_TRUE(f.sources.pushFile(name));
+    EXPECT_FALSE(f.sources.canOpenOneMore());
+    ASSERT_TRUE(f.sources.pushFile(name));
+    EXPECT_TRUE(f.sources.leaveEndedFile());
+    EXPECT_TRUE(f.sources.canOpenOneMore());
+    ASSERT_TRUE(f.sources.pushFile(name));
+    EXPECT_FALSE(f.sources.canOpenOneMore());
+}
+
 }  // namespace
 }  // namespace umpre

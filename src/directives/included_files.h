@@ -1,0 +1,70 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_DIRECTIVES_INCLUDED_FILES_H
+#define UMPRE_DIRECTIVES_INCLUDED_FILES_H
+
+#include <string_view>
+#include <utility>
+
+#include "directives/conditionals.h"
+#include "directives/file_finder.h"
+#include "directives/guard_watch.h"
+#include "lex/output_writer.h"
+#include "lex/reporter.h"
+#include "lex/run_options.h"
+#include "lex/scanner_stack.h"
+#include "umpre/event.h"
+
+namespace umpre {
+
+/// Enters included files, and passes over those that would come out empty.
+class IncludedFiles {
+public:
+    IncludedFiles(ScannerStack& sources, OutputWriter& output, const Conditionals& conditionals,
+                  Reporter& reporter, const RunOptions& options)
+        : sources_(sources),
+          output_(output),
+          reporter_(reporter),
+          finder_(sources, output, reporter, options),
+          guards_(conditionals, output, reporter) {}
+
+    /// Adds a directory to search, after those added before.
+    void addDirectory(std::string_view directory) { finder_.addDirectory(directory); }
+
+    /// Looks for a file and enters it: a quoted name as it is first, then any name in the
+    /// directories. It may already be known where the search leads, see `find`. A file that would
+    /// come out empty is passed over. Reports a file that is nowhere.
+    void open(std::string_view name, IncludeForm form, Search* search);
+
+    /// Asks before a file is looked for on the disk; nobody, if empty.
+    void setResolver(IncludeResolver resolver) { finder_.setResolver(std::move(resolver)); }
+
+    /// Tells which files are entered and which are missed; nobody, if empty.
+    void setObserver(Observer observer) { finder_.setObserver(std::move(observer)); }
+
+    /// Returns an earlier search for this name, otherwise null. It lives as long as this object.
+    [[nodiscard]] Search* find(std::string_view name, IncludeForm form) {
+        return finder_.find(name, form);
+    }
+
+    /// Says that time may have passed.
+    void lookAtClock() { finder_.lookAtClock(); }
+
+    /// A directive was met in active text, or text whose names may be macros.
+    void noteAction() noexcept { guards_.noteAction(); }
+
+    /// The current file, an included one, has ended, and its groups are closed.
+    void fileEnds() { guards_.fileEnds(sources_.currentFile().isReadWhole()); }
+
+private:
+    [[nodiscard]] bool passOver(Search& search);
+
+    ScannerStack& sources_;
+    OutputWriter& output_;
+    Reporter& reporter_;
+    FileFinder finder_;
+    GuardWatch guards_;
+};
+
+}  // namespace umpre
+
+#endif
