@@ -72,9 +72,10 @@ def comparison_row(result):
     return cells
 
 
-def write_comparison(results, start_up):
+def write_comparison(results, start_up, runs):
     """Writes the tables of ratios, times and memory, and the plot of the ratios."""
-    head = ["workload", "MB", "ratio", "goal", "fastest peer", "umpre", *PEERS, "umpre MB", "gcc MB"]
+    head = ["workload", "MB", "ratio", "goal", "fastest peer"]
+    head += ["umpre", *PEERS, "umpre MB", "gcc MB"]
     rows = [
         [
             result.workload,
@@ -83,12 +84,11 @@ def write_comparison(results, start_up):
             f"{GOALS[result.workload]:g}",
             result.best_peer(),
             *comparison_row(result),
-            megabytes(result.memory["umpre"]),
-            megabytes(result.memory["gcc"]),
+            *(megabytes(result.memory[name]) for name in ("umpre", "gcc")),
         ]
         for result in results
     ]
-    put("ratios", table(head, rows))
+    put("ratios", f"Medians of {runs} runs, times in milliseconds:\n\n" + table(head, rows))
     names = ["umpre", *PEERS]
     rows = [
         ["CPU time, ms", *(milliseconds(start_up.cpu[name]) for name in names)],
@@ -96,8 +96,8 @@ def write_comparison(results, start_up):
     ]
     put("start-up", table(["empty file", *names], rows))
     data = "".join(
-        f'"{result.workload}" {result.ratio():.2f} {GOALS[result.workload]} "{result.best_peer()}"\n'
-        for result in results
+        f'"{row.workload}" {row.ratio():.2f} {GOALS[row.workload]} "{row.best_peer()}"\n'
+        for row in results
     )
     plot("ratios", data)
 

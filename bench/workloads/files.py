@@ -45,16 +45,16 @@ def distinct(folder, rng, scale):
     """Different headers in four search folders, each read once."""
     writer = Writer(rng)
     count = max(10, round(7000 * scale))
-    places = [(rng.randrange(4), f"module{rng.randrange(20):02}/unit{n:04}.h") for n in range(count)]
+    names = [f"module{rng.randrange(20):02}/unit{n:04}.h" for n in range(count)]
     code = [line for line in writer.code_lines(4000) if not line.lstrip().startswith("/*")]
     roots = []
-    for number, (place, name) in enumerate(places):
+    for number, name in enumerate(names):
         inner = []
         if number % 10 == 0:
             roots.append(f"#include <{name}>\n")
-            inner = [f"#include <{other}>\n" for _, other in places[number + 1 : number + 10]]
+            inner = [f"#include <{other}>\n" for other in names[number + 1 : number + 10]]
         text = large_header(writer, code, number, "".join(inner))
-        folder.write(f"inc{place}/{name}", text)
+        folder.write(f"inc{rng.randrange(4)}/{name}", text)
     folder.write("main.c", "".join(roots))
 
 
@@ -62,10 +62,11 @@ def large_header(writer, code, number, inclusions):
     """Returns a guarded header of about 2300 bytes, as libraries have them."""
     rng = writer.rng
     lines = [f" * {writer.prose(9)}" for _ in range(7)]
-    text = ["/*\n", "\n".join(lines), "\n */\n", f"#ifndef UNIT_{number}_H\n#define UNIT_{number}_H\n"]
-    text.append(inclusions)
+    text = ["/*\n", "\n".join(lines), "\n */\n"]
+    text += (f"#ifndef UNIT_{number}_H\n#define UNIT_{number}_H\n", inclusions)
     for n, name in enumerate(rng.sample(writer.names, 10)):
-        text.append(f"#define UNIT_{number}_{name.upper()} (0x{rng.randrange(1 << 16):04x} + {n})\n")
+        value = f"(0x{rng.randrange(1 << 16):04x} + {n})"
+        text.append(f"#define UNIT_{number}_{name.upper()} {value}\n")
     first, second = rng.sample(writer.names, 2)
     text.append(f"#define unit{number}_{first}(a, b) ((a) * UNIT_{number}_SIZE + (b))\n")
     text.append(f"/** {writer.prose(10)}. */\nstruct unit{number}_{second} {{\n")
@@ -75,7 +76,8 @@ def large_header(writer, code, number, inclusions):
     text.append("#endif\n")
     for name in rng.sample(writer.names, 8):
         a, b = rng.sample(writer.names, 2)
-        text.append(f"/* {writer.prose(6)}. */\nextern int unit{number}_{name}(int {a}, char *{b});\n")
+        text.append(f"/* {writer.prose(6)}. */\n")
+        text.append(f"extern int unit{number}_{name}(int {a}, char *{b});\n")
     text.append(f"#endif /* UNIT_{number}_H */\n")
     return "".join(text)
 

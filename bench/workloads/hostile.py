@@ -10,9 +10,9 @@ def hostile(folder, rng, scale):
     """Huge tokens, lines of unclosed quotes, nested calls."""
     writer = Writer(rng, 1000)
     text = ["#define f(x) x\n#define g(x) (x + 1)\n#define h(a, b) a b\n"]
-    text += huge_tokens(writer, round(MB * scale))
-    text += unclosed_quotes(writer, round(1.25 * MB * scale))
-    text += nested_calls(writer, round(2 * MB * scale))
+    text += huge_tokens(writer, round(1.15 * MB * scale))
+    text += unclosed_quotes(writer, round(1.6 * MB * scale))
+    text += nested_calls(writer, round(0.5 * MB * scale))
     folder.write("main.c", "".join(text))
 
 
@@ -21,7 +21,8 @@ def huge_tokens(writer, size):
     yield "int " + writer.fill(writer.names, size) + ";\n"
     yield "int a = " + "7" * size + ";\n"
     yield "int b = 0x" + "A5" * (size // 2) + ";\n"
-    yield 'char *c = "' + writer.fill([writer.prose(3), "\\n", '\\"', "\\\\", "/*", "//"], size) + '";\n'
+    items = [writer.prose(3), "\\n", '\\"', "\\\\", "/*", "//"]
+    yield 'char *c = "' + writer.fill(items, size) + '";\n'
     yield "int d; /*" + writer.fill([writer.prose(3), "* ", "/", "\n", '"'], size) + "*/\n"
     yield "int e; //" + writer.fill([writer.prose(3), "*", " ", '"'], size) + "\n"
     yield "#define CHAIN " + "a \\\n" * (size // 4) + "b\nCHAIN;\n"
@@ -31,7 +32,7 @@ def unclosed_quotes(writer, size):
     """Yields lines with quotes that nothing closes, long ones and many short ones."""
     yield '"' + '\\"' * (size // 2) + "\n"
     yield "'" + "\\'" * (size // 2) + "\n"
-    yield "\" don't " + writer.fill(["it's ", "isn't ", "name ", "12 "], size).replace("'", "\\'") + "\n"
+    yield "\" don't " + writer.fill(["it\\'s ", "isn\\'t ", "name ", "12 "], size) + "\n"
     lines = [f"    {writer.prose(4)} don't {writer.prose(3)}\n" for _ in range(500)]
     lines += [f'    "{writer.prose(4)} \\" {writer.prose(3)}\n' for _ in range(500)]
     yield writer.fill(lines, size)

@@ -47,7 +47,7 @@ FOREIGN = re.compile(
 # And so is one that says otherwise what another one has said, and one that continues text with a
 # backslash, which umpre keeps.
 EXCLUDED = re.compile(
-    r"gnutls/gnutlsxx|gnutls/openssl|libxml/globals|linux/byteorder/|asm/unistd|asm/posix_types_x?32"
+    r"gnutls/(gnutlsxx|openssl)|libxml/globals|linux/byteorder/|asm/(unistd|posix_types_x?32)"
 )
 # Where a header is named, by #include itself or by a macro for it.
 NAMED = re.compile(
