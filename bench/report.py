@@ -88,7 +88,8 @@ def write_comparison(results, start_up, runs):
         ]
         for result in results
     ]
-    put("ratios", f"Medians of {runs} runs, times in milliseconds:\n\n" + table(head, rows))
+    image = "![A bar for each workload: the ratio, with its goal](ratios.svg)\n\n"
+    put("ratios", image + f"Medians of {runs} runs, times in milliseconds:\n\n" + table(head, rows))
     names = ["umpre", *PEERS]
     rows = [
         ["CPU time, ms", *(milliseconds(start_up.cpu[name]) for name in names)],
@@ -143,7 +144,8 @@ def write_growth(rows):
         ]
         for row in rows
     ]
-    put("growth", table(head, lines))
+    image = "![Lines of time against size for each workload](growth.svg)\n\n"
+    put("growth", image + table(head, lines))
     blocks = [
         f'"{row.results[0].workload}"\n'
         + "".join(f"{r.size / 1e6:.3f} {r.cpu['umpre'] * 1000:.3f}\n" for r in row.results)

@@ -10,7 +10,6 @@
 #include <utility>
 
 #include "lex/file_identity.h"
-
 #include "lex/run_options.h"
 
 namespace umpre {
