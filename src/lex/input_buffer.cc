@@ -147,6 +147,9 @@ bool InputBuffer::hasCome(Need need, std::size_t kept, std::size_t& searched) {
 // Looks for a limit behind the first `searched` bytes, which have none. Returns false if there is
 // none, or only one within a line that may yet end in this window.
 bool InputBuffer::findLimit(std::size_t& searched) {
+    if (searched == filled_) {
+        return false;
+    }
     const void* const lineEnd = ::memrchr(begin_ + searched, '\n', filled_ - searched);
     if (lineEnd != nullptr) {
         limit_ = static_cast<std::size_t>(static_cast<const char*>(lineEnd) - begin_) + 1;

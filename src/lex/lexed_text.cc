@@ -46,7 +46,7 @@ void LexedText::clear() {
 }
 
 void LexedText::append(TokenKind kind, std::string_view text, Name* name) {
-    std::memcpy(text_.extend(text.size()), text.data(), text.size());
+    text.copy(text_.extend(text.size()), text.size());
     Entry entry(kind, text_.size(), name);
     entry.set(Entry::kNotable,
               isName(kind) || kind == TokenKind::NEWLINE || kind == TokenKind::KW_DEFINED);
