@@ -16,6 +16,7 @@ build_packages=(
 )
 test_packages=(
     "python3|python3|runs the golden cases"
+    "make|make|the other of the two generators that a sample is built with"
     "time|/usr/bin/time|takes the memory of a program, which a shell cannot"
     "libgtest-dev|/usr/include/gtest/gtest.h|the unit tests' framework"
     "zlib1g-dev|/usr/include/zlib.h|headers to preprocess"
