@@ -24,6 +24,11 @@ void NameFilter::add(std::string_view name) {
     bits_[bit / 64] |= std::uint64_t{1} << bit % 64;
 }
 
+void NameFilter::clear() noexcept {
+    hashes_.clear();
+    std::fill(bits_.begin(), bits_.end(), 0);
+}
+
 void NameFilter::grow() {
     --shift_;
     bits_.assign(2 * bits_.size(), 0);

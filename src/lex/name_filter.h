@@ -50,6 +50,8 @@ public:
 
     void add(std::string_view name);
 
+    void clear() noexcept;
+
     /// Returns how many names were added.
     [[nodiscard]] std::size_t size() const noexcept { return hashes_.size(); }
 

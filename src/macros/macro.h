@@ -45,6 +45,15 @@ public:
 
     void noteUse() const noexcept { wasUsed_ = true; }
 
+    /// What an object-like macro comes out as in text, as of a version of the table; without bytes
+    /// if that has to be read token by token.
+    struct Expansion {
+        std::uint64_t version = 0;
+        std::string_view text;
+    };
+
+    mutable Expansion expansion;
+
     /// The text made ready for use, of an object-like macro and of a function-like one; nothing
     /// until that is worth keeping.
     mutable SharedText tokens;
@@ -66,8 +75,9 @@ private:
     mutable bool wasUsed_ = false;
 };
 
-/// A name that was defined at least once, and its last definition.
-struct MacroName : Name {
+/// A name that was defined at least once, and its last definition. What a use in text mostly looks
+/// at stands in the first of two cache lines.
+struct alignas(64) MacroName : Name {
     Macro macro;
 };
 

@@ -24,8 +24,11 @@ namespace umpre {
 using enum TokenKind;
 
 std::string_view MacroExpander::expandName(const Token& token) {
-    MacroName* name = nullptr;
-    switch (lookAt(token, name)) {
+    MacroName* const name = entryOf(token);
+    if (const std::optional<std::string_view> text = knownText(name)) {
+        return *text;
+    }
+    switch (lookAt(name)) {
     case Outcome::Name: return token.text;
     case Outcome::Uncalled: written_.assign(skipped_).append(name->text); return written_;
     case Outcome::Text: return text_->joined();
@@ -59,8 +62,16 @@ std::string MacroExpander::expandLine(std::string_view text, LineKind kind) {
     return std::string(result.tokens().joined());
 }
 
-MacroExpander::Outcome MacroExpander::lookAt(const Token& token, MacroName*& name) {
-    name = entryOf(token);
+// Returns what a name in a file's text comes out as, if that is known without reading it.
+std::optional<std::string_view> MacroExpander::knownText(const MacroName* name) {
+    if (name == nullptr || name->macro.functionLike() || sources_.plainRoad()
+        || sources_.noExpandSet() != NoExpandSet()) {
+        return std::nullopt;
+    }
+    return memo_.textOf(*name);
+}
+
+MacroExpander::Outcome MacroExpander::lookAt(MacroName* name) {
     if (name == nullptr || sets_.contains(sources_.noExpandSet(), *name)) {
         return Outcome::Name;
     }
@@ -241,8 +252,8 @@ void MacroExpander::takeList(Pieces& result) {
 
 bool MacroExpander::readName(const Token& token, Pieces& result) {
     const NoExpandSet noExpand = sources_.noExpandSet();
-    MacroName* name = nullptr;
-    switch (lookAt(token, name)) {
+    MacroName* const name = entryOf(token);
+    switch (lookAt(name)) {
     case Outcome::Name: result.append(token, noExpand); break;
     case Outcome::Uncalled:
         lexer_.append(result.open(), skipped_);

@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -15,6 +16,7 @@
 #include "lex/shared_text.h"
 #include "lex/text_lexer.h"
 #include "macros/arguments.h"
+#include "macros/expansion_memo.h"
 #include "macros/macro_body.h"
 #include "macros/macro_table.h"
 #include "macros/substitution.h"
@@ -37,6 +39,7 @@ public:
           reporter_(reporter),
           lexer_(lexer),
           bodies_(lexer, macros),
+          memo_(macros),
           collector_(sources, macros, reporter, lexer.texts()),
           substitution_(sources, macros, reporter, lexer, sets_) {}
 
@@ -63,8 +66,9 @@ private:
         Abandoned,  // an invocation with the wrong arguments: the name is left
     };
 
-    [[nodiscard]] Outcome lookAt(const Token& token, MacroName*& name);
     [[nodiscard]] MacroName* entryOf(const Token& token);
+    [[nodiscard]] std::optional<std::string_view> knownText(const MacroName* name);
+    [[nodiscard]] Outcome lookAt(MacroName* name);
     void refresh(MacroName& name);
     [[nodiscard]] Outcome replaceObject(const MacroName& name);
     [[nodiscard]] bool isText(const LexedText& text) const;
@@ -88,6 +92,7 @@ private:
     TextLexer& lexer_;
     NoExpandSets sets_;
     BodyMaker bodies_;
+    ExpansionMemo memo_;
     ArgumentCollector collector_;
     Substitution substitution_;
     LineKind lineKind_ = LineKind::Operand;

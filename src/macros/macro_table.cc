@@ -61,6 +61,7 @@ void MacroTable::enterNames(LexedText& text) {
 void MacroTable::defineMacro(std::string_view name, std::string_view text) {
     MacroName& entry = enter(name);
     if (!entry.isDefined) {
+        noteChange(name);
         replace(entry, {text, {}, false});
     }
 }
@@ -71,6 +72,7 @@ MacroTable::Definition MacroTable::define(std::string_view name, const MacroText
     if (!isAdded && entry.macro.text() == definition.text) {
         return Definition::Same;
     }
+    noteChange(name);
     replace(entry, definition);
     return isAdded ? Definition::Added : Definition::Replaced;
 }
@@ -113,9 +115,17 @@ void MacroTable::addToFilter(const Name& name) {
 void MacroTable::undefine(std::string_view name) {
     MacroName* const entry = find(name);
     if (entry != nullptr) {
+        noteChange(name);
         entry->isDefined = false;
         entry->macro.tokens = {};
         entry->macro.body.reset();
+    }
+}
+
+void MacroTable::noteChange(std::string_view name) {
+    if (watched_.size() > 0 && watched_.mayHold(name)) {
+        watched_.clear();
+        ++version_;
     }
 }
 

@@ -58,6 +58,17 @@ public:
     /// Removes a name; does nothing if it is not defined.
     void undefine(std::string_view name);
 
+    /// Makes the version change when this name is defined, redefined or undefined.
+    void watch(std::string_view name) {
+        if (!watched_.mayHold(name)) {
+            watched_.add(name);
+        }
+    }
+
+    /// Returns a number, not 0, that stays the same while the watched names keep their definitions.
+    /// With another version, no names are watched at first.
+    [[nodiscard]] std::uint64_t version() const noexcept { return version_; }
+
     /// Returns the filter that every defined name passes.
     [[nodiscard]] const NameFilter& filter() const noexcept { return filter_; }
 
@@ -78,6 +89,7 @@ private:
     [[nodiscard]] MacroName& newName();
     [[nodiscard]] char* newBytes(std::size_t size);
     void addToFilter(const Name& name);
+    void noteChange(std::string_view name);
     void grow();
 
     std::pmr::monotonic_buffer_resource bytes_;  // of names and definitions
@@ -85,6 +97,8 @@ private:
     std::size_t nameCount_ = 0;
     std::vector<Slot> slots_;  // open addressing; at most three of four are taken
     NameFilter filter_;
+    NameFilter watched_;  // by readers of definitions
+    std::uint64_t version_ = 1;
     std::deque<Name> unknown_;  // the last one stands for what was never defined
     bool unknownIsNoted_ = false;
 };

@@ -671,5 +671,21 @@ TEST(Roads, AgreeOnFilesIncludedAgain) {
     }
 }
 
+// What a macro comes out as is kept, as long as no definition changes that it depends on.
+TEST(Roads, AgreeOnMacrosUsedAgain) {
+    expectSameOnAllRoads({
+        "#define O (I I)\n#define I 1\nO O\n#undef I\nO O\n#define I 2\nO O I\n",
+        "#define O I\n#define I J\nO O\n#define J O I J\nO O I J\n",
+        "#define O F\n#define F(x) <x>\nO O(1) O (2) O\n(3) O\n#undef F\nO O(4)\n",
+        "#define O __LINE__\nO O\nO\n#define P __FILE__ O\nP P\nP\n",
+        "#define O /\nO/ O* O\n#define P /O/\nP P\n",
+        "#define O \"\nO O\" O\n#define P \\\nP P\nP\n",
+        "#define O # if\nO O\nO\n#if 0 O\nO\n#endif\n",
+        "#define O defined I\n#define I 1\nO O\n#if O\nO\n#endif\n",
+        "#define O I\n#define F(x) x O x\nF(O) F(O) O\n#define I 2\nF(O) O I\n",
+        "#define if else\n#define else if\nif else if else\n",
+    });
+}
+
 }  // namespace
 }  // namespace umpre
