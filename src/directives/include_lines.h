@@ -44,19 +44,21 @@ public:
 
     /// Returns what is known of the line that a file's text begins with, or null. It is valid until
     /// `keep` is called.
-    [[nodiscard]] const Known* find(std::string_view text) const;
+    [[nodiscard]] const Known* find(std::string_view text);
 
 private:
-    static constexpr std::size_t kSlots = 4096;
-
-    [[nodiscard]] static std::size_t slotOf(std::string_view line) noexcept {
-        return hashOfName(line) % kSlots;
-    }
+    static constexpr std::size_t kFewestSlots = 256;
+    static constexpr std::size_t kMostSlots = 65536;
 
     [[nodiscard]] bool isPartOfName(const Token& token, IncludeOperand& operand) const;
+    [[nodiscard]] Known& slotOf(std::string_view line) noexcept;
+    void makeRoom();
 
     MacroTable& macros_;
-    std::vector<Known> known_;
+    // By their hashes: each line stands in the first free slot from the one that its hash says. At
+    // most half of the slots are in use, whose number is a power of two.
+    std::vector<Known> slots_;
+    std::size_t used_ = 0;
 };
 
 }  // namespace umpre

@@ -6,9 +6,12 @@
 namespace umpre {
 
 void IncludedFiles::open(std::string_view name, IncludeForm form, Search* search) {
-    if (search != nullptr && passOver(*search)) {
-        return;
+    if (search == nullptr || !passOver(*search)) {
+        enter(name, form);
     }
+}
+
+void IncludedFiles::enter(std::string_view name, IncludeForm form) {
     if (finder_.enter(name, form)) {
         guards_.fileEntered(finder_.entered());
     } else {
@@ -16,8 +19,6 @@ void IncludedFiles::open(std::string_view name, IncludeForm form, Search* search
     }
 }
 
-// Does what entering the file that the search leads to and reading it would do, if that is known;
-// otherwise returns false, nothing done.
 bool IncludedFiles::passOver(Search& search) {
     if (!sources_.canOpenOneMore()) {
         return false;

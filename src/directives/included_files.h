@@ -30,10 +30,16 @@ public:
     /// Adds a directory to search, after those added before.
     void addDirectory(std::string_view directory) { finder_.addDirectory(directory); }
 
-    /// Looks for a file and enters it: a quoted name as it is first, then any name in the
-    /// directories. It may already be known where the search leads, see `find`. A file that would
-    /// come out empty is passed over. Reports a file that is nowhere.
+    /// Passes over a file or enters it. It may already be known where the search leads, see `find`.
     void open(std::string_view name, IncludeForm form, Search* search);
+
+    /// Looks for a file and enters it: a quoted name as it is first, then any name in the
+    /// directories. Reports a file that is nowhere.
+    void enter(std::string_view name, IncludeForm form);
+
+    /// Does what entering the file that a search leads to and reading it would do, if it would come
+    /// out empty. Otherwise, or if that is not known, returns false with nothing done.
+    [[nodiscard]] bool passOver(Search& search);
 
     /// Asks before a file is looked for on the disk; nobody, if empty.
     void setResolver(IncludeResolver resolver) { finder_.setResolver(std::move(resolver)); }
@@ -56,8 +62,6 @@ public:
     void fileEnds() { guards_.fileEnds(sources_.currentFile().isReadWhole()); }
 
 private:
-    [[nodiscard]] bool passOver(Search& search);
-
     ScannerStack& sources_;
     OutputWriter& output_;
     Reporter& reporter_;

@@ -32,21 +32,22 @@ DirectiveLine::Outcome Inclusion::includeDirective(DirectiveLine& line) {
 }
 
 bool Inclusion::includeLines(CppFileScanner& file) {
-    bool any = false;
-    while (sources_.fileReadNow() == &file) {
-        const IncludeLines::Known* const line = lines_.find(file.wholeLines());
-        if (line == nullptr) {
-            break;
-        }
-        if (!any) {
-            files_.lookAtClock();
-        }
-        any = true;
+    const IncludeLines::Known* line = lines_.find(file.wholeLines());
+    if (line == nullptr) {
+        return false;
+    }
+    files_.lookAtClock();
+    while (line != nullptr) {
         file.advance(line->bytes.size(), 1, true);
         files_.noteAction();
-        files_.open(line->search->name, line->search->form, line->search);
+        Search& search = *line->search;
+        if (!files_.passOver(search)) {
+            files_.enter(search.name, search.form);
+            break;
+        }
+        line = lines_.find(file.wholeLines());
     }
-    return any;
+    return true;
 }
 
 std::optional<Inclusion::Operand> Inclusion::readOperand() {
