@@ -1,0 +1,134 @@
+// SPDX-License-Identifier: MIT
+#include "run.h"
+
+#include <algorithm>
+#include <ctime>
+#include <string>
+#include <string_view>
+
+#include "check.h"
+#include "driver/preprocessor.h"
+#include "lex/byte_sink.h"
+#include "memory_limit.h"
+#include "support/descriptors.h"
+
+namespace umpre::fuzz {
+namespace {
+
+constexpr std::size_t kMostOutput = std::size_t{64} * 1024;
+constexpr std::size_t kMostMemory = std::size_t{32} * 1024 * 1024;
+constexpr std::size_t kMostFiles = 40;
+
+// Keeps what is written, up to a limit.
+class LimitedSink final : public ByteSink {
+public:
+    [[nodiscard]] bool write(std::string_view bytes) override {
+        isFull_ = isFull_ || bytes_.size() + bytes.size() > kMostOutput;
+        if (!isFull_) {
+            bytes_.append(bytes);
+        }
+        return !isFull_;
+    }
+
+    [[nodiscard]] const std::string& bytes() const noexcept { return bytes_; }
+
+    [[nodiscard]] bool isFull() const noexcept { return isFull_; }
+
+private:
+    std::string bytes_;
+    bool isFull_ = false;
+};
+
+// What a run gave.
+struct Outcome {
+    std::string output;
+    std::string messages;
+    std::string asked;  // for these files
+    RunResult result = RunResult::Clean;
+    bool isCut = false;  // it met a limit
+};
+
+enum class Source { Text, File };
+
+struct Run {
+    Run(const Files& files, const RunOptions& options)
+        : preprocessor([this](const Diagnostic& diagnostic) { add(diagnostic); }, options) {
+        preprocessor.setOutput(sink);
+        preprocessor.addIncludeDirectory("d");
+        preprocessor.setResolver([this, &files](std::string_view name) {
+            outcome.asked.append(name).append("\n");
+            return ++included <= kMostFiles ? files.find(name)
+                                            : IncludeAnswer{IncludeAnswer::Kind::Absent, {}};
+        });
+    }
+
+    // That there is no memory is a limit's doing.
+    void add(const Diagnostic& diagnostic) {
+        if (diagnostic.severity != Severity::Failure) {
+            outcome.messages.append(messageOf(diagnostic));
+        }
+    }
+
+    Outcome outcome;
+    LimitedSink sink;
+    std::size_t included = 0;
+    Preprocessor preprocessor;
+};
+
+[[nodiscard]] Outcome outcomeOf(const Files& files, const RunOptions& options, Source source) {
+    const MemoryLimit memory(kMostMemory);
+    Run run(files, options);
+    if (source == Source::Text) {
+        run.preprocessor.openText("main", files.main);
+    } else {
+        const testing::MemoryFile file(files.main);
+        const std::string name = "/proc/self/fd/" + std::to_string(file.descriptor());
+        if (!run.preprocessor.openSource(name, "main")) {
+            fail("the source cannot be opened");
+        }
+    }
+    run.outcome.result = run.preprocessor.run();
+    run.outcome.output = run.sink.bytes();
+    run.outcome.isCut = run.sink.isFull() || memory.wasMet();
+    return run.outcome;
+}
+
+void expectSameOutcome(const Outcome& found, const Outcome& expected) {
+    if (found.isCut || expected.isCut) {
+        const auto expectSameSoFar = [](std::string_view what, std::string_view one,
+                                        std::string_view other) {
+            const std::size_t size = std::min(one.size(), other.size());
+            expectSame(what, one.substr(0, size), other.substr(0, size));
+        };
+        expectSameSoFar("output", found.output, expected.output);
+        expectSameSoFar("messages", found.messages, expected.messages);
+        expectSameSoFar("files", found.asked, expected.asked);
+        return;
+    }
+    expectSame("output", found.output, expected.output);
+    expectSame("messages", found.messages, expected.messages);
+    expectSame("files", found.asked, expected.asked);
+    if (found.result != expected.result) {
+        fail("result differs: is " + std::to_string(static_cast<int>(found.result)) + ", should be "
+             + std::to_string(static_cast<int>(expected.result)));
+    }
+}
+
+}  // namespace
+
+void expectSameOnAllRoads(const Files& files, std::size_t windowSize) {
+    std::time_t start = 0;
+    Outcome plain;
+    Outcome fast;
+    Outcome windows;
+    do {  // within one second, because of __TIME__
+        start = std::time(nullptr);
+        plain = outcomeOf(files, {.plainRoad = true}, Source::Text);
+        fast = outcomeOf(files, {}, Source::Text);
+        windows = outcomeOf(files, {.windowSize = windowSize}, Source::File);
+    } while (std::time(nullptr) != start);
+    expectSameOutcome(fast, plain);
+    expectSameOutcome(windows, plain);
+}
+
+}  // namespace umpre::fuzz
