@@ -82,7 +82,7 @@ DirectiveLine::DirectiveLine(CppFileScanner& file) : file_(file) {
 
 Token DirectiveLine::next() {
     const Token token = tokenAt(at_);
-    at_ += token.text.size();
+    at_ += isAtEnd() ? 0 : token.text.size();
     return token;
 }
 

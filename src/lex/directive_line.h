@@ -50,7 +50,8 @@ public:
     /// Tells whether no continuation was passed so far: the file's line is that of the bytes read.
     [[nodiscard]] bool isOneLine() const noexcept { return lines_ == 0; }
 
-    /// Reads the token that comes next, as `tokenAt` tells it.
+    /// Reads the token that comes next, as `tokenAt` tells it. The line's end, OTHER, is not
+    /// passed: what is behind it may not be there.
     [[nodiscard]] Token next();
 
     /// Reads the rest of the line up to its end and returns it with one space for each run of
