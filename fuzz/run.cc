@@ -2,9 +2,13 @@
 #include "run.h"
 
 #include <algorithm>
+#include <cstdlib>
 #include <ctime>
+#include <initializer_list>
+#include <iostream>
 #include <string>
 #include <string_view>
+#include <utility>
 
 #include "check.h"
 #include "driver/preprocessor.h"
@@ -16,7 +20,7 @@ namespace umpre::fuzz {
 namespace {
 
 constexpr std::size_t kMostOutput = std::size_t{64} * 1024;
-constexpr std::size_t kMostMemory = std::size_t{32} * 1024 * 1024;
+constexpr std::size_t kMostMemory = std::size_t{8} * 1024 * 1024;
 constexpr std::size_t kMostFiles = 40;
 
 // Keeps what is written, up to a limit.
@@ -114,9 +118,19 @@ void expectSameOutcome(const Outcome& found, const Outcome& expected) {
     }
 }
 
+void show(const Files& files) {
+    for (const auto& [name, text] : std::initializer_list<std::pair<const char*, std::string_view>>{
+             {"a", files.a}, {"b", files.b}, {"d/c", files.c}, {"main", files.main}}) {
+        std::cout << name << ":\n    " << printable(text) << "\n";
+    }
+}
+
 }  // namespace
 
 void expectSameOnAllRoads(const Files& files, std::size_t windowSize) {
+    if (std::getenv("UMPRE_FUZZ_SHOW") != nullptr) {
+        show(files);
+    }
     std::time_t start = 0;
     Outcome plain;
     Outcome fast;
