@@ -142,6 +142,7 @@ std::shared_ptr<KnownFile> FileFinder::remember(const std::string& path,
     }
     std::shared_ptr<KnownFile>& file = files_[path];
     if (file == nullptr || file->identity != identity) {
+        changes_ += file == nullptr ? 0U : 1U;
         file = std::make_shared<KnownFile>(KnownFile{path, identity, nullptr, {}});
     }
     return file;

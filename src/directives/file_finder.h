@@ -71,6 +71,12 @@ public:
     /// Says that time may have passed.
     void lookAtClock();
 
+    /// Returns what stands for now: it is another value when files may have changed.
+    [[nodiscard]] std::size_t moment() const {
+        // All of these only grow, so the sum is the same only if each of them is.
+        return clock_ + changes_ + sources_.waits() + output_.waits() + reporter_.reportCount();
+    }
+
     /// Returns the file that a search leads to if it is a known one, otherwise null.
     [[nodiscard]] const KnownFile* fileOf(Search& search) {
         return search.moment == moment() || isStill(search) ? search.file.get() : nullptr;
@@ -95,11 +101,6 @@ private:
     template <typename Value>
     using ByName = std::unordered_map<std::string, Value, Hash, std::equal_to<>>;
 
-    // All of these only grow, so the sum is the same only if each of them is.
-    [[nodiscard]] std::size_t moment() const {
-        return clock_ + sources_.waits() + output_.waits() + reporter_.reportCount();
-    }
-
     [[nodiscard]] bool enterPath(const std::string& path);
     [[nodiscard]] bool open(const std::string& path);
     [[nodiscard]] bool isStill(Search& search);
@@ -122,6 +123,7 @@ private:
     ByName<std::shared_ptr<KnownFile>> files_;  // by their paths
     std::array<ByName<Search>, 2> searches_;    // by the form of the name
     std::size_t clock_ = 0;
+    std::size_t changes_ = 0;  // of files, that were met
     std::int64_t searchTime_ = 0;
     std::shared_ptr<KnownFile> entered_;
 };

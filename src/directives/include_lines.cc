@@ -1,18 +1,12 @@
 // SPDX-License-Identifier: MIT
 #include "directives/include_lines.h"
 
-#include <algorithm>
-#include <utility>
-
 #include "lex/spelling.h"
 
 namespace umpre {
 namespace {
 
 using enum TokenKind;
-
-// A line that can be known begins like this.
-constexpr std::string_view kBegin = "#in";
 
 // Tells whether a byte stands for itself in a quoted name.
 [[nodiscard]] bool isPlain(char byte) noexcept {
@@ -66,52 +60,8 @@ bool IncludeLines::isPartOfName(const Token& token, IncludeOperand& operand) con
 
 // With no macro name that was not there before, no name of the line can have become one.
 void IncludeLines::keep(std::string_view text, const IncludeOperand& operand, Search* search) {
-    const std::string_view line = text.substr(0, text.find('\n') + 1);
-    if (search == nullptr || !operand.isLasting || line.substr(0, kBegin.size()) != kBegin) {
-        return;
-    }
-    if (2 * used_ >= slots_.size()) {
-        makeRoom();
-    }
-    Known& known = slotOf(line);
-    if (known.bytes.empty()) {
-        ++used_;
-    }
-    known = {std::string(line), search, macros_.filter().size()};
-}
-
-const IncludeLines::Known* IncludeLines::find(std::string_view text) {
-    if (slots_.empty() || text.substr(0, kBegin.size()) != kBegin) {
-        return nullptr;
-    }
-    const std::string_view line = text.substr(0, text.find('\n') + 1);
-    const Known& known = slotOf(line);
-    return known.search != nullptr && known.macroNames == macros_.filter().size() ? &known
-                                                                                  : nullptr;
-}
-
-// Returns the slot of this line, or the free one for it.
-IncludeLines::Known& IncludeLines::slotOf(std::string_view line) noexcept {
-    const std::size_t mask = slots_.size() - 1;
-    std::size_t slot = hashOfName(line) & mask;
-    while (!slots_[slot].bytes.empty() && slots_[slot].bytes != line) {
-        slot = (slot + 1) & mask;
-    }
-    return slots_[slot];
-}
-
-// Doubles the slots. When there are very many, it forgets the lines instead.
-void IncludeLines::makeRoom() {
-    std::vector<Known> before(std::clamp(2 * slots_.size(), kFewestSlots, kMostSlots));
-    before.swap(slots_);
-    if (before.size() == kMostSlots) {
-        used_ = 0;
-        return;
-    }
-    for (Known& known : before) {
-        if (!known.bytes.empty()) {
-            slotOf(known.bytes) = std::move(known);
-        }
+    if (search != nullptr && operand.isLasting) {
+        known_.keep(text, *search, macros_.filter().size());
     }
 }
 

@@ -2,16 +2,13 @@
 #ifndef UMPRE_DIRECTIVES_INCLUDE_LINES_H
 #define UMPRE_DIRECTIVES_INCLUDE_LINES_H
 
-#include <cstddef>
 #include <optional>
-#include <string>
 #include <string_view>
-#include <vector>
 
 #include "directives/file_finder.h"
 #include "directives/include_form.h"
+#include "directives/known_lines.h"
 #include "lex/directive_line.h"
-#include "lex/name_filter.h"
 #include "macros/macro_table.h"
 
 namespace umpre {
@@ -26,13 +23,6 @@ struct IncludeOperand {
 /// Reads `#include` lines as bytes.
 class IncludeLines {
 public:
-    /// A line that was met before.
-    struct Known {
-        std::string bytes;           ///< its line end included
-        Search* search = nullptr;    ///< what it leads to
-        std::size_t macroNames = 0;  ///< that there were so far
-    };
-
     explicit IncludeLines(MacroTable& macros) noexcept : macros_(macros) {}
 
     /// Reads a line from behind its word up to its end. Returns nothing if the scanner or a macro
@@ -44,21 +34,16 @@ public:
 
     /// Returns what is known of the line that a file's text begins with, or null. It is valid until
     /// `keep` is called.
-    [[nodiscard]] const Known* find(std::string_view text);
+    [[nodiscard]] KnownLines::Line* find(std::string_view text) noexcept {
+        KnownLines::Line* const line = known_.find(text);
+        return line != nullptr && line->macroNames == macros_.filter().size() ? line : nullptr;
+    }
 
 private:
-    static constexpr std::size_t kFewestSlots = 256;
-    static constexpr std::size_t kMostSlots = 65536;
-
     [[nodiscard]] bool isPartOfName(const Token& token, IncludeOperand& operand) const;
-    [[nodiscard]] Known& slotOf(std::string_view line) noexcept;
-    void makeRoom();
 
     MacroTable& macros_;
-    // By their hashes: each line stands in the first free slot from the one that its hash says. At
-    // most half of the slots are in use, whose number is a power of two.
-    std::vector<Known> slots_;
-    std::size_t used_ = 0;
+    KnownLines known_;
 };
 
 }  // namespace umpre

@@ -32,4 +32,24 @@ bool IncludedFiles::passOver(Search& search) {
     return true;
 }
 
+bool IncludedFiles::passOver(Search& search, Passage& passage) {
+    const std::size_t moment = finder_.moment();
+    if (passage.guard == nullptr || passage.moment != moment) {
+        if (!passOver(search)) {
+            return false;
+        }
+        passage = {search.moment, search.file->guard, Snippet(search.file->guardedText)};
+        return true;
+    }
+    CppFileScanner& file = sources_.currentFile();
+    const Snippet& markerEnd = file.markerEnd();
+    if (!passage.guard->isDefined || !sources_.canOpenOneMore() || passage.text.isEmpty()
+        || markerEnd.isEmpty()) {
+        return passOver(search);
+    }
+    output_.writeSnippet(passage.text);
+    output_.writeLineMarker(file.position().line, markerEnd);
+    return true;
+}
+
 }  // namespace umpre

@@ -2,19 +2,30 @@
 #ifndef UMPRE_DIRECTIVES_INCLUDED_FILES_H
 #define UMPRE_DIRECTIVES_INCLUDED_FILES_H
 
+#include <cstddef>
 #include <string_view>
 #include <utility>
 
 #include "directives/conditionals.h"
 #include "directives/file_finder.h"
 #include "directives/guard_watch.h"
+#include "lex/no_expand_set.h"
 #include "lex/output_writer.h"
 #include "lex/reporter.h"
 #include "lex/run_options.h"
 #include "lex/scanner_stack.h"
+#include "lex/snippet.h"
 #include "umpre/event.h"
 
 namespace umpre {
+
+/// What there is to do for a file that is passed over. It lies beside the line that names the file,
+/// so that nothing else has to be looked at.
+struct Passage {
+    std::size_t moment = 0;       ///< of the search
+    const Name* guard = nullptr;  ///< while it is defined, the file is passed over; null: unknown
+    Snippet text;                 ///< what comes out
+};
 
 /// Enters included files, and passes over those that would come out empty.
 class IncludedFiles {
@@ -40,6 +51,8 @@ public:
     /// Does what entering the file that a search leads to and reading it would do, if it would come
     /// out empty. Otherwise, or if that is not known, returns false with nothing done.
     [[nodiscard]] bool passOver(Search& search);
+    /// Does the same with the passage of this search, if that is known, and keeps it otherwise.
+    [[nodiscard]] bool passOver(Search& search, Passage& passage);
 
     /// Asks before a file is looked for on the disk; nobody, if empty.
     void setResolver(IncludeResolver resolver) { finder_.setResolver(std::move(resolver)); }

@@ -32,20 +32,21 @@ DirectiveLine::Outcome Inclusion::includeDirective(DirectiveLine& line) {
 }
 
 bool Inclusion::includeLines(CppFileScanner& file) {
-    const IncludeLines::Known* line = lines_.find(file.wholeLines());
+    std::string_view text = file.wholeLines();
+    KnownLines::Line* line = lines_.find(text);
     if (line == nullptr) {
         return false;
     }
     files_.lookAtClock();
     while (line != nullptr) {
-        file.advance(line->bytes.size(), 1, true);
+        file.advance(line->text.size(), 1, true);
         files_.noteAction();
-        Search& search = *line->search;
-        if (!files_.passOver(search)) {
-            files_.enter(search.name, search.form);
+        if (!files_.passOver(*line->search, line->passage)) {
+            files_.enter(line->search->name, line->search->form);
             break;
         }
-        line = lines_.find(file.wholeLines());
+        text.remove_prefix(line->text.size());
+        line = lines_.find(text);
     }
     return true;
 }

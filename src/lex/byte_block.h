@@ -36,10 +36,28 @@ public:
         return ByteBlock(bytes.data());
     }
 
+    /// Writes the 64 bytes to `at`.
+    void copyTo(char* at) const noexcept {
+        simde_mm_storeu_si128(at, first_);
+        simde_mm_storeu_si128(at + 16, second_);
+        simde_mm_storeu_si128(at + 32, third_);
+        simde_mm_storeu_si128(at + 48, fourth_);
+    }
+
     /// Returns where any of some bytes stand.
     template <typename... Bytes>
     [[nodiscard]] Mask any(Bytes... bytes) const noexcept {
         return maskOf([bytes...](Part part) noexcept { return either(equal(part, bytes)...); });
+    }
+
+    /// Returns where both blocks have the same bytes.
+    [[nodiscard]] Mask same(const ByteBlock& other) const noexcept {
+        const auto bits = [](Part part, Part otherPart) noexcept {
+            const int mask = simde_mm_movemask_epi8(simde_mm_cmpeq_epi8(part, otherPart));
+            return static_cast<Mask>(static_cast<unsigned>(mask));
+        };
+        return bits(first_, other.first_) | bits(second_, other.second_) << 16U
+               | bits(third_, other.third_) << 32U | bits(fourth_, other.fourth_) << 48U;
     }
 
     /// Returns where ASCII letters and underscores stand.

@@ -10,10 +10,10 @@ CppFileScanner::CppFileScanner(CommentSink& commentSink, const RunOptions& optio
 
 bool CppFileScanner::open(const std::string& fileName) {
     if (fileName.empty()) {
-        fileName_ = "stdin";
+        setFileName("stdin");
         input_.openBorrowed(STDIN_FILENO);
     } else if (input_.openFile(fileName)) {
-        fileName_ = fileName;
+        setFileName(fileName);
     } else {
         return false;
     }
@@ -22,7 +22,7 @@ bool CppFileScanner::open(const std::string& fileName) {
 }
 
 void CppFileScanner::openText(const std::string& fileName, std::string_view text) {
-    fileName_ = fileName;
+    setFileName(fileName);
     input_.openText(text);
     start();
 }

@@ -2,6 +2,7 @@
 #ifndef UMPRE_LEX_CPP_FILE_SCANNER_H
 #define UMPRE_LEX_CPP_FILE_SCANNER_H
 
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -9,6 +10,8 @@
 #include "lex/cpp_scanner.h"
 #include "lex/input_buffer.h"
 #include "lex/literal.h"
+#include "lex/output_writer.h"
+#include "lex/snippet.h"
 #include "lex/source_position.h"
 
 namespace umpre {
@@ -29,7 +32,18 @@ public:
     /// The name in messages and line markers.
     [[nodiscard]] const std::string& fileName() const noexcept { return fileName_; }
 
-    void setFileName(std::string_view name) { fileName_ = name; }
+    void setFileName(std::string_view name) {
+        fileName_ = name;
+        markerEnd_.reset();
+    }
+
+    /// Returns what stands in the file's markers behind the line; empty if that is too long.
+    [[nodiscard]] const Snippet& markerEnd() {
+        if (!markerEnd_) {
+            markerEnd_.emplace(OutputWriter::markerEndOf(fileName_));
+        }
+        return *markerEnd_;
+    }
 
     void setLine(std::int32_t line) noexcept { lexer_.setLine(line); }
 
@@ -78,6 +92,7 @@ private:
     InputBuffer input_;
     CppLexer lexer_;
     std::string fileName_;
+    std::optional<Snippet> markerEnd_;
     bool lastWasNewline_ = true;
 };
 

@@ -15,12 +15,15 @@ constexpr std::size_t kMarkerSize = 24;
     return at + text.copy(at, text.size());
 }
 
-// Writes a marker into memory that is large enough. Returns its end.
-[[nodiscard]] char* putMarker(char* at, const SourcePosition& position) noexcept {
+// Writes a marker up to its line into memory that is large enough. Returns its end.
+[[nodiscard]] char* putMarkerBegin(char* at, std::int32_t line) noexcept {
     at = put(at, "#line ");
-    at = std::to_chars(at, at + kMarkerSize, position.line).ptr;
+    return std::to_chars(at, at + kMarkerSize, line).ptr;
+}
+
+// Writes the rest of a marker.
+[[nodiscard]] char* putMarkerEnd(char* at, std::string_view name) noexcept {
     at = put(at, " \"");
-    std::string_view name = position.fileName;
     for (std::size_t end = name.find('\\'); end != std::string_view::npos; end = name.find('\\')) {
         at = put(at, name.substr(0, end + 1));
         *at++ = '\\';
@@ -28,6 +31,10 @@ constexpr std::size_t kMarkerSize = 24;
     }
     at = put(at, name);
     return put(at, "\"\n");
+}
+
+[[nodiscard]] char* putMarker(char* at, const SourcePosition& position) noexcept {
+    return putMarkerEnd(putMarkerBegin(at, position.line), position.fileName);
 }
 
 }  // namespace
@@ -63,10 +70,27 @@ void OutputWriter::writeLineMarker(const SourcePosition& position) {
     used_ += static_cast<std::size_t>(putMarker(begin, position) - begin);
 }
 
+void OutputWriter::writeLineMarker(std::int32_t line, const Snippet& markerEnd) {
+    outputLine_ = line;
+    if (kMarkerSize + Snippet::kRoom > kBlockSize - used_) {
+        flush();
+    }
+    char* const begin = block_.data() + used_;
+    used_ += static_cast<std::size_t>(putMarkerBegin(begin, line) - begin);
+    writeSnippet(markerEnd);
+}
+
 std::string OutputWriter::markerOf(const SourcePosition& position) {
     std::string marker(kMarkerSize + 2 * position.fileName.size(), '\0');
     marker.resize(static_cast<std::size_t>(putMarker(marker.data(), position) - marker.data()));
     return marker;
+}
+
+std::string OutputWriter::markerEndOf(std::string_view fileName) {
+    std::string markerEnd(kMarkerSize + 2 * fileName.size(), '\0');
+    char* const end = putMarkerEnd(markerEnd.data(), fileName);
+    markerEnd.resize(static_cast<std::size_t>(end - markerEnd.data()));
+    return markerEnd;
 }
 
 void OutputWriter::flush() {

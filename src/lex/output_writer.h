@@ -10,6 +10,7 @@
 #include <vector>
 
 #include "lex/byte_sink.h"
+#include "lex/snippet.h"
 #include "lex/source_position.h"
 
 namespace umpre {
@@ -31,6 +32,16 @@ public:
             return;
         }
         used_ += text.copy(block_.data() + used_, text.size());
+    }
+
+    /// Writes a snippet as it is.
+    void writeSnippet(const Snippet& snippet) {
+        if (Snippet::kRoom > kBlockSize - used_) {
+            write(snippet.text());
+            return;
+        }
+        snippet.block().copyTo(block_.data() + used_);
+        used_ += snippet.size();
     }
 
     /// Writes the line feed that stands for a line end of the input, and counts it.
@@ -63,8 +74,14 @@ public:
     /// Writes `#line N "name"` with every backslash of the name doubled, and counts from there.
     void writeLineMarker(const SourcePosition& position);
 
+    /// Does the same for the file whose markers end like this.
+    void writeLineMarker(std::int32_t line, const Snippet& markerEnd);
+
     /// Returns the marker of a position.
     [[nodiscard]] static std::string markerOf(const SourcePosition& position);
+
+    /// Returns what stands in the markers of a file behind the line.
+    [[nodiscard]] static std::string markerEndOf(std::string_view fileName);
 
     /// Hands everything written to the sink.
     void flush();

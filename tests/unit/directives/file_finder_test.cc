@@ -147,6 +147,16 @@ TEST(FileFinder, SeesInTheNextMomentThatAFileHasChanged) {
     EXPECT_NE(i.finder.entered(), before);
 }
 
+TEST(FileFinder, BeginsAMomentWhenAFileTurnsOutToHaveChanged) {
+    FinderFixture i;
+    i.enterTwice("a.h", Brackets);
+    EXPECT_TRUE(i.finder.enter(i.directory.nameOf("two/a.h"), Quotes));
+    i.directory.write("two/a.h", "something else\n");
+    EXPECT_EQ(i.known("a.h", Brackets), i.directory.nameOf("two/a.h"));
+    EXPECT_TRUE(i.finder.enter(i.directory.nameOf("two/a.h"), Quotes));
+    EXPECT_EQ(i.known("a.h", Brackets), "no file");
+}
+
 TEST(FileFinder, SeesInTheNextMomentThatAFileIsGone) {
     FinderFixture i;
     i.enterTwice("a.h", Brackets);

@@ -34,6 +34,34 @@ struct FilesFixture {
                         {.settlingTime = RunOptions::kAlwaysSettled}};
 };
 
+// a.h was read so often that it is known to come out empty.
+struct EmptyFileFixture : FilesFixture {
+    EmptyFileFixture() : name(directory.write("one/a.h", "#ifndef G\n#endif\n")) {
+        f.define("G", "");
+        includeAsTheMainLoopDoes();
+        includeAsTheMainLoopDoes();
+        EXPECT_EQ(f.written(), "\n\n\n\n");
+        f.sink.clear();
+    }
+
+    void includeAsTheMainLoopDoes() {
+        open("a.h");
+        conditionals.enterFileGroups();
+        files.noteAction();
+        EXPECT_TRUE(conditionals.carryOut(f.readWord()));
+        f.sources.skipToEndOfLine();
+        EXPECT_TRUE(conditionals.carryOut(f.readWord()));
+        f.sources.skipToEndOfLine();
+        f.output.endLines(2);
+        conditionals.closeFileGroups();
+        files.fileEnds();
+        (void)f.sources.peek();
+    }
+
+    std::string name;
+    std::string passed = "#line 1 \"" + name + "\"\n\n\n#line 1 \"main\"\n";
+};
+
 TEST(IncludedFiles, OpensAFile) {
     FilesFixture i;
     i.open("a.h");
@@ -56,32 +84,51 @@ TEST(IncludedFiles, ANameWithAZeroByteOpensNothing) {
 }
 
 TEST(IncludedFiles, PassesOverAFileThatComesOutEmpty) {
-    FilesFixture i;
-    const std::string name = i.directory.write("one/a.h", "#ifndef G\n#endif\n");
-    i.f.define("G", "");
-    const auto includeAsTheMainLoopDoes = [&i] {
-        i.open("a.h");
-        i.conditionals.enterFileGroups();
-        i.files.noteAction();
-        EXPECT_TRUE(i.conditionals.carryOut(i.f.readWord()));
-        i.f.sources.skipToEndOfLine();
-        EXPECT_TRUE(i.conditionals.carryOut(i.f.readWord()));
-        i.f.sources.skipToEndOfLine();
-        i.f.output.endLines(2);
-        i.conditionals.closeFileGroups();
-        i.files.fileEnds();
-        (void)i.f.sources.peek();
-    };
-    includeAsTheMainLoopDoes();
-    includeAsTheMainLoopDoes();
+    EmptyFileFixture i;
     const std::string events = i.f.fileEvents.events();
-    (void)i.f.written();
     i.open("a.h");
     EXPECT_EQ(i.f.fileEvents.events(), events);
-    EXPECT_EQ(i.f.written(), "\n\n\n\n#line 1 \"" + name + "\"\n\n\n#line 1 \"main\"\n");
+    EXPECT_EQ(i.f.written(), i.passed);
     i.f.macros.undefine("G");
     i.open("a.h");
-    EXPECT_EQ(i.f.fileEvents.events(), events + " +" + name);
+    EXPECT_EQ(i.f.fileEvents.events(), events + " +" + i.name);
+}
+
+TEST(IncludedFiles, KeepsAPassageOverAFile) {
+    EmptyFileFixture i;
+    Search& search = *i.files.find("a.h", IncludeForm::Brackets);
+    Passage passage;
+    EXPECT_TRUE(i.files.passOver(search, passage));
+    EXPECT_EQ(passage.guard, i.f.macros.find("G"));
+    EXPECT_EQ(passage.text.text(), "#line 1 \"" + i.name + "\"\n\n\n");
+    EXPECT_TRUE(i.files.passOver(search, passage));
+    EXPECT_EQ(i.f.written(), i.passed + i.passed);
+    i.f.macros.undefine("G");
+    EXPECT_FALSE(i.files.passOver(search, passage));
+}
+
+TEST(IncludedFiles, LooksAtAPassageAnewInTheNextMoment) {
+    EmptyFileFixture i;
+    Search& search = *i.files.find("a.h", IncludeForm::Brackets);
+    Passage passage;
+    EXPECT_TRUE(i.files.passOver(search, passage));
+    i.directory.write("one/a.h", "something else\n");
+    EXPECT_TRUE(i.files.passOver(search, passage));
+    i.f.reporter.reportError("a message");
+    EXPECT_FALSE(i.files.passOver(search, passage));
+}
+
+TEST(IncludedFiles, PassesOverAFileWhoseMarkerIsLong) {
+    EmptyFileFixture i;
+    Search& search = *i.files.find("a.h", IncludeForm::Brackets);
+    const std::string name(70, 'm');
+    i.f.sources.currentFile().setFileName(name);
+    Passage passage;
+    for (int times = 0; times < 3; ++times) {
+        EXPECT_TRUE(i.files.passOver(search, passage));
+        EXPECT_EQ(i.f.written(), "#line 1 \"" + i.name + "\"\n\n\n#line 1 \"" + name + "\"\n");
+        i.f.sink.clear();
+    }
 }
 
 }  // namespace

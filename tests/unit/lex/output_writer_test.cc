@@ -167,6 +167,35 @@ TEST_F(OutputWriterTest, AMarkerTakesALongName) {
     EXPECT_EQ(written(), "#line 1 \"" + name + "\"\n");
 }
 
+TEST_F(OutputWriterTest, WritesSnippetsWhereverABlockEnds) {
+    for (std::size_t before = 65'400; before < 65'600; ++before) {
+        RecordingSink other;
+        OutputWriter writer;
+        writer.redirect(other);
+        const std::string text(before, 'x');
+        writer.write(text);
+        writer.writeSnippet(Snippet("a snippet"));
+        writer.writeLineMarker(12, Snippet(OutputWriter::markerEndOf("f")));
+        writer.write("y");
+        writer.flush();
+        EXPECT_EQ(other.bytes(), text + "a snippet#line 12 \"f\"\ny");
+    }
+}
+
+TEST_F(OutputWriterTest, AMarkerIsTheSameInOnePieceAndInTwo) {
+    for (const std::string_view name : {"f", "dir/file.src", R"(c:\dir\f.h)", ""}) {
+        for (const std::int32_t line : {1, 0, 123456, -1}) {
+            RecordingSink other;
+            OutputWriter writer;
+            writer.redirect(other);
+            writer.writeLineMarker(line, Snippet(OutputWriter::markerEndOf(name)));
+            EXPECT_TRUE(writer.isAt({name, line}));
+            writer.flush();
+            EXPECT_EQ(other.bytes(), OutputWriter::markerOf({name, line}));
+        }
+    }
+}
+
 TEST_F(OutputWriterTest, SyncingWritesAMarkerOnlyIfTheLinesDiffer) {
     output.writeLineMarker({"f", 1});
     output.syncTo({"f", 1});

@@ -29,6 +29,8 @@ public:
 
     [[nodiscard]] const std::string& bytes() const noexcept { return bytes_; }
 
+    void clear() { bytes_.clear(); }
+
     [[nodiscard]] std::size_t calls() const noexcept { return calls_; }
 
 private:
