@@ -58,7 +58,14 @@ public:
     /// Returns false only if the name was never added.
     [[nodiscard]] bool mayHold(std::string_view name) const noexcept {
         std::array<char, kChunk> bytes{};
-        return mayHoldAmongBytes(padded(name, bytes));
+        if (name.size() >= kChunk) {
+            return mayHoldAmongBytes(name);
+        }
+        // For so few bytes, a loop is quicker than a call.
+        for (std::size_t index = 0; index < name.size(); ++index) {
+            bytes[index] = name[index];
+        }
+        return mayHoldAmongBytes({bytes.data(), name.size()});
     }
 
     /// The same for a name from whose first eight bytes can be read.

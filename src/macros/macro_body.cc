@@ -187,6 +187,25 @@ private:
     bool failed_ = false;
 };
 
+void noteNames(MacroBody& body) {
+    const LexedText& tokens = *body.tokens;
+    for (std::size_t index = 0; index < tokens.size(); ++index) {
+        if (isName(tokens.kind(index))) {
+            body.names.push_back(tokens.name(index));
+        }
+    }
+}
+
+// Tells whether a text as lexed has nothing but text to it, so that lexing parts of it yields its
+// tokens.
+[[nodiscard]] bool isPlainText(const LexedText& text) {
+    bool isPlain = !text.hasEffects();
+    for (std::size_t index = 0; index < text.size() && isPlain; ++index) {
+        isPlain = text.isClean(index);
+    }
+    return isPlain;
+}
+
 }  // namespace
 
 SharedText BodyMaker::tokensOf(const Macro& macro) {
@@ -213,6 +232,8 @@ const MacroBody& BodyMaker::bodyOf(const Macro& macro) {
         lexer_.append(source, macro.text());
         macros_.enterNames(source);
         BodyBuilder(macro, source, *body).build();
+        body->isPlain = isPlainText(source);
+        noteNames(*body);
         if (source.hasEffects()) {
             body->source = std::move(source);
         }

@@ -48,6 +48,9 @@ struct MacroBody {
     LexedText source;  // the text as lexed, if reading it has effects
     std::vector<BodyStep> steps;
     std::vector<BodyOperand> operands;
+    std::vector<const Name*> names;  // of its own tokens
+    /// Replacing is a matter of the bytes of this body and the arguments.
+    bool isPlain = false;
 };
 
 /// Makes bodies.

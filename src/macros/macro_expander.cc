@@ -62,13 +62,29 @@ std::string MacroExpander::expandLine(std::string_view text, LineKind kind) {
     return std::string(result.tokens().joined());
 }
 
-// Returns what a name in a file's text comes out as, if that is known without reading it.
+// Returns what a name in a file's text comes out as, if that is told by bytes.
 std::optional<std::string_view> MacroExpander::knownText(const MacroName* name) {
-    if (name == nullptr || name->macro.functionLike() || sources_.plainRoad()
-        || sources_.noExpandSet() != NoExpandSet()) {
+    if (name == nullptr || sources_.plainRoad() || sources_.noExpandSet() != NoExpandSet()) {
         return std::nullopt;
     }
-    return memo_.textOf(*name);
+    return name->macro.functionLike() ? callText(*name) : memo_.textOf(*name);
+}
+
+std::optional<std::string_view> MacroExpander::callText(const MacroName& name) {
+    CppFileScanner* const file = sources_.fileReadNow();
+    const std::string_view ahead = file == nullptr ? std::string_view() : file->bytesAhead();
+    const std::size_t open = ahead.find_first_not_of(" \t");
+    if (open == std::string_view::npos || ahead[open] != '(') {
+        return std::nullopt;
+    }
+    call_.clear();
+    const char* const end =
+        texts_.expandCall(name, ahead.data() + open, ahead.data() + ahead.size(), call_);
+    if (end == nullptr) {
+        return std::nullopt;
+    }
+    file->advance(static_cast<std::size_t>(end - ahead.data()), 0, false);
+    return call_.view();
 }
 
 MacroExpander::Outcome MacroExpander::lookAt(MacroName* name) {

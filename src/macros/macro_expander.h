@@ -20,6 +20,8 @@
 #include "macros/macro_body.h"
 #include "macros/macro_table.h"
 #include "macros/substitution.h"
+#include "macros/text_buffer.h"
+#include "macros/text_expander.h"
 
 namespace umpre {
 
@@ -39,7 +41,8 @@ public:
           reporter_(reporter),
           lexer_(lexer),
           bodies_(lexer, macros),
-          memo_(macros),
+          texts_(macros, bodies_),
+          memo_(macros, texts_),
           collector_(sources, macros, reporter, lexer.texts()),
           substitution_(sources, macros, reporter, lexer, sets_) {}
 
@@ -68,6 +71,7 @@ private:
 
     [[nodiscard]] MacroName* entryOf(const Token& token);
     [[nodiscard]] std::optional<std::string_view> knownText(const MacroName* name);
+    [[nodiscard]] std::optional<std::string_view> callText(const MacroName& name);
     [[nodiscard]] Outcome lookAt(MacroName* name);
     void refresh(MacroName& name);
     [[nodiscard]] Outcome replaceObject(const MacroName& name);
@@ -92,6 +96,7 @@ private:
     TextLexer& lexer_;
     NoExpandSets sets_;
     BodyMaker bodies_;
+    TextExpander texts_;
     ExpansionMemo memo_;
     ArgumentCollector collector_;
     Substitution substitution_;
@@ -102,6 +107,7 @@ private:
     std::vector<std::shared_ptr<const MacroBody>> retired_;
     std::string skipped_;
     std::string written_;
+    TextBuffer call_;
     SharedText text_;
 };
 

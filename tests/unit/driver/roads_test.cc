@@ -687,5 +687,32 @@ TEST(Roads, AgreeOnMacrosUsedAgain) {
     });
 }
 
+TEST(Roads, AgreeOnCalls) {
+    std::string definitions =
+        "#define F(x) [x]\n#define G() 0\n#define H(a,b) a b\n#define J(a,b) a##b\n"
+        "#define S(x) #x\n#define R(x) F(x) R(x)\n#define P(x) x\n#define K(f,x) f(x)\n"
+        "#define L(x) __LINE__ x\n#define Q(x) x \" x\n#define E\n#define M F(1) F\n";
+    for (const std::string_view calls : {
+             "F(1) F (1) F\t( 1 ) F",
+             "F(a,) F() F(1,2,3) G() G(1) H(,x) H(,) H(x,)",
+             "F(F(F(N))) F(R(1)) R(R(N)) P(R)(1)",
+             "P(F)(1) P(F) (2) P(P)(F)(3) K(F,K(F,1)) K(K,1)",
+             "F(a  b) F(a\tb) F(\"a  b\") F(a/**/b) F(a//b\n) F(c\n)",
+             "J(F,(1)) J(,F)(1) J(/,/) J(/,*) J(\",\") J(\\,N) J(1,x) J(0,x1)",
+             "S(a + \"b\") S('\"') S(\\) S(\"\\\") S(N) S( a  b ) S(\")",
+             "L(1) L(__LINE__) F(__FILE__) F(L(1))",
+             "Q(1) P(Q(2)) F(Q(\"3\"))",
+             "M(2) M (2) P(M(3)) P(M)(4) F(M) M",
+             "F(<)< <F(<) P(<)P(<) H(<,<) H(E,E) H(E,) F(E)",
+             "F(defined) F(defined N) P(if) F(#) F(##)",
+             "P(1)P(2) P(a)P(b) P(P(a)b) P(aP(b)) P(-P(-1))",
+             "x F(1) \\\n F(2) F(3\n4) F(5)\n",
+             "F(F (1)) P(F)(2)",
+             "F('a') F('') F('a,b') F(\"\\\"\") F(\"",
+         }) {
+        expectSameOnAllRoads(definitions + std::string(calls) + "\nend\n" + std::string(calls));
+    }
+}
+
 }  // namespace
 }  // namespace umpre

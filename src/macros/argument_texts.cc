@@ -1,0 +1,124 @@
+// SPDX-License-Identifier: MIT
+#include "macros/argument_texts.h"
+
+#include <array>
+
+#include "lex/plain_text.h"
+
+namespace umpre {
+namespace {
+
+// What matters about a byte of an argument, at the beginning of a token.
+enum class Byte : unsigned char { Passed, Name, Number, Blank, Delimiter, Unusual };
+
+constexpr std::array<Byte, 256> kBytes = [] {
+    std::array<Byte, 256> bytes{};
+    for (std::size_t at = 0; at < bytes.size(); ++at) {
+        const char byte = static_cast<char>(at);
+        switch (textByte(byte)) {
+        case TextByte::Plain: bytes[at] = isBlankByte(byte) ? Byte::Blank : Byte::Passed; break;
+        case TextByte::Unusual: bytes[at] = Byte::Unusual; break;
+        case TextByte::Digit: bytes[at] = Byte::Number; break;
+        case TextByte::Name: bytes[at] = Byte::Name; break;
+        }
+    }
+    for (const char byte : std::string_view("(),")) {
+        bytes[static_cast<unsigned char>(byte)] = Byte::Delimiter;
+    }
+    return bytes;
+}();
+
+[[nodiscard]] const char* skipBlanks(const char* at, const char* end) noexcept {
+    while (at < end && isBlankByte(*at)) {
+        ++at;
+    }
+    return at;
+}
+
+class Reader {
+public:
+    Reader(const char* end, const NameFilter& macroNames) : end_(end), macroNames_(macroNames) {}
+
+    /// Reads one argument, from its first byte to the "," or ")" that ends it. Returns null if it
+    /// does not stand as it should.
+    [[nodiscard]] const char* read(const char* at, ArgumentText& argument) const {
+        const char* const begin = at;
+        std::size_t depth = 0;
+        while (at != nullptr && at < end_) {
+            switch (kBytes[static_cast<unsigned char>(*at)]) {
+            case Byte::Passed: ++at; break;
+            case Byte::Name: at = passName(at, argument); break;
+            case Byte::Blank: {
+                const char* const behind = passBlanks(at, depth);
+                if (behind != nullptr && endsArgument(behind, depth)) {
+                    argument.raw = {begin, static_cast<std::size_t>(at - begin)};
+                    return behind;
+                }
+                at = behind;
+                break;
+            }
+            case Byte::Delimiter:
+                if (endsArgument(at, depth)) {
+                    argument.raw = {begin, static_cast<std::size_t>(at - begin)};
+                    return at;
+                }
+                depth += *at == '(' ? 1 : 0;
+                depth -= *at == ')' ? 1 : 0;
+                ++at;
+                break;
+            case Byte::Number:
+            case Byte::Unusual: at = unusualTokenEnd(at, end_); break;
+            }
+        }
+        return nullptr;
+    }
+
+private:
+    [[nodiscard]] const char* passName(const char* at, ArgumentText& argument) const {
+        const char* const behind = plainNameEnd(at);
+        const std::string_view name(at, static_cast<std::size_t>(behind - at));
+        argument.mayHaveMacros = argument.mayHaveMacros || macroNames_.mayHold(name);
+        return behind;
+    }
+
+    // Returns where blanks end, or null if they are neither one space nor at the argument's end.
+    [[nodiscard]] const char* passBlanks(const char* at, std::size_t depth) const {
+        const char* const behind = skipBlanks(at, end_);
+        const bool isSpace = *at == ' ' && behind == at + 1;
+        return isSpace || (behind < end_ && endsArgument(behind, depth)) ? behind : nullptr;
+    }
+
+    [[nodiscard]] static bool endsArgument(const char* at, std::size_t depth) noexcept {
+        return depth == 0 && (*at == ',' || *at == ')');
+    }
+
+    const char* end_;
+    const NameFilter& macroNames_;
+};
+
+}  // namespace
+
+const char* takeArgumentTexts(const char* open, const char* end, std::size_t count,
+                              const NameFilter& macroNames, std::vector<ArgumentText>& arguments) {
+    const Reader reader(end, macroNames);
+    const char* at = open + 1;
+    for (std::size_t taken = 0;; ++taken) {
+        at = skipBlanks(at, end);
+        if (at < end && *at == ')') {
+            return taken == count ? at + 1 : nullptr;
+        }
+        if (at == end || taken == count) {
+            return nullptr;
+        }
+        at = reader.read(at, arguments.emplace_back());
+        if (at == nullptr) {
+            return nullptr;
+        }
+        if (*at == ')') {
+            return taken + 1 == count ? at + 1 : nullptr;
+        }
+        ++at;
+    }
+}
+
+}  // namespace umpre

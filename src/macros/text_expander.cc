@@ -1,0 +1,297 @@
+// SPDX-License-Identifier: MIT
+//
+// On the token road a replacement is tokens with a set of names that must not be expanded in it,
+// pushed to be read again. Here it is a text, added to what comes out. With
+//
+//     #define MAX(a, b) ((a) > (b) ? (a) : (b))
+//     #define LIMIT(x) MAX(x, FLOOR)
+//     #define FLOOR 0
+//
+// LIMIT(y + 1) is read as "MAX(y + 1, FLOOR)", because its body has names of macros; of that, the
+// arguments come out as "y + 1" and "0", and MAX is replaced by the texts of its body and of these,
+// which hold no macro and are not read again.
+//
+// A text stands for tokens only if lexing it yields these tokens. Texts that are put together are
+// told apart from others by the bytes that meet (`mayMeet`), and every token is looked at, so that
+// none is a comment, a line end or a lone quote. The set of names that must not be expanded is that
+// of the replacements around, the same for all of a text: for an argument's names it is, because
+// they have the set of the call, to which the replacement's is added. Names of macros that stay in
+// a replacement within an argument had another set, so they are left to the token road, as is a
+// function-like macro's name at the end of a replacement, whose "(" may follow.
+#include "macros/text_expander.h"
+
+#include <algorithm>
+
+#include "lex/literal.h"
+#include "lex/plain_text.h"
+#include "lex/token_join.h"
+#include "macros/argument_texts.h"
+#include "macros/predefined_macros.h"
+#include "macros/stringize.h"
+
+namespace umpre {
+namespace {
+
+// The token road has quicker ways to nest deeply, and takes no memory for what is large.
+constexpr std::size_t kDeepest = 32;
+constexpr std::size_t kMostWork = std::size_t{1} << 20U;  // bytes
+constexpr std::size_t kWorkOfReading = 16;
+
+[[nodiscard]] std::string_view viewOf(const char* begin, const char* end) noexcept {
+    return {begin, static_cast<std::size_t>(end - begin)};
+}
+
+}  // namespace
+
+void TextExpander::begin(bool watches) noexcept {
+    watches_ = watches;
+    depth_ = 0;
+    work_ = 0;
+    around_.clear();
+    arguments_.clear();
+    buffersUsed_ = 0;
+}
+
+bool TextExpander::expandObject(const MacroName& name, TextBuffer& to) {
+    begin(true);
+    macros_.watch(name.text);
+    Result result{to, true};
+    // The text around ends with the name.
+    const char* const behind = name.text.data() + name.text.size();
+    return replace(name, behind, behind, Place::Replacement, result) != nullptr;
+}
+
+const char* TextExpander::expandCall(const MacroName& name, const char* open, const char* end,
+                                     TextBuffer& to) {
+    if (isRefreshed(name)) {
+        return nullptr;
+    }
+    begin(false);
+    Result result{to, true};
+    return replaceCall(name, open, end, Place::Replacement, result);
+}
+
+// Reads a text and adds what it comes out as. As everything here it returns false, or null, if that
+// is not told by bytes; nothing is cleaned up then.
+bool TextExpander::read(std::string_view text, Place place, Result& result) {
+    ++depth_;
+    work_ += text.size() + kWorkOfReading;
+    if (depth_ > kDeepest || work_ > kMostWork) {
+        return false;
+    }
+    const char* const end = text.data() + text.size();
+    const char* run = text.data();
+    const char* at = run;
+    while (at != nullptr && at < end) {
+        const TextByte kind = textByte(*at);
+        if (kind == TextByte::Plain) {
+            ++at;
+        } else if (kind != TextByte::Name) {
+            at = unusualTokenEnd(at, end);
+        } else {
+            const char* const behind = plainNameEnd(at);
+            const MacroName* const name = macroOf(viewOf(at, behind));
+            const char* next = behind;
+            if (name != nullptr && stays(*name, behind, end, place)) {
+                result.hasMacros = true;
+            } else if (name != nullptr) {
+                const bool isAdded = add(viewOf(run, at), result);
+                next = isAdded ? replace(*name, behind, end, place, result) : nullptr;
+                run = next;
+            }
+            at = next;
+        }
+    }
+    --depth_;
+    return at != nullptr && add(viewOf(run, end), result);
+}
+
+// Returns where replacements in a text at this place stand.
+TextExpander::Place TextExpander::within(Place place) noexcept {
+    return place == Place::Replacement ? Place::Replacement : Place::WithinArgument;
+}
+
+// Tells whether a macro's name stays as it is.
+bool TextExpander::stays(const MacroName& name, const char* behind, const char* end,
+                         Place place) const {
+    if (place == Place::WithinArgument) {
+        return false;
+    }
+    if (isAround(name)) {
+        return true;
+    }
+    if (!name.macro.functionLike()) {
+        return false;
+    }
+    return behind == end ? place == Place::Argument : *behind != '(' && !isBlankByte(*behind);
+}
+
+// Adds what a macro is replaced by, and returns the end of what it took of the text.
+const char* TextExpander::replace(const MacroName& name, const char* behind, const char* end,
+                                  Place place, Result& result) {
+    if (isRefreshed(name) || isAround(name)) {
+        return nullptr;
+    }
+    if (!name.macro.functionLike()) {
+        around_.push_back(&name);
+        const bool isTold = read(name.macro.text(), within(place), result);
+        around_.pop_back();
+        return isTold ? behind : nullptr;
+    }
+    while (behind < end && isBlankByte(*behind)) {
+        ++behind;
+    }
+    return behind < end && *behind == '(' ? replaceCall(name, behind, end, place, result) : nullptr;
+}
+
+const char* TextExpander::replaceCall(const MacroName& name, const char* open, const char* end,
+                                      Place place, Result& result) {
+    const std::size_t argumentsBefore = arguments_.size();
+    const std::size_t buffersBefore = buffersUsed_;
+    const char* const behind =
+        takeArgumentTexts(open, end, name.macro.parameterCount(), macros_.filter(), arguments_);
+    const MacroBody& body = bodies_.bodyOf(name.macro);
+    if (behind == nullptr || !body.isPlain) {
+        return nullptr;
+    }
+    work_ += static_cast<std::size_t>(behind - open);
+    Result replacement{takeBuffer()};
+    if (!substitute(body, argumentsBefore, replacement)) {
+        return nullptr;
+    }
+    bool isTold = false;
+    if (hasMacros(body) || replacement.hasMacros) {
+        around_.push_back(&name);
+        isTold = read(replacement.text.view(), within(place), result);
+        around_.pop_back();
+    } else {
+        isTold = add(replacement.text.view(), result);
+    }
+    arguments_.resize(argumentsBefore);
+    buffersUsed_ = buffersBefore;
+    return isTold ? behind : nullptr;
+}
+
+bool TextExpander::substitute(const MacroBody& body, std::size_t firstArgument, Result& result) {
+    bool isTold = true;
+    for (const BodyStep& step : body.steps) {
+        switch (step.kind) {
+        case BodyStep::Kind::Tokens:
+            isTold = add(body.tokens->joined(step.first, step.last), result);
+            break;
+        case BodyStep::Kind::Argument:
+            isTold = addArgument(firstArgument + step.first, result);
+            break;
+        case BodyStep::Kind::Joined: isTold = addJoined(body, step, firstArgument, result); break;
+        default: isTold = false;
+        }
+        if (!isTold) {
+            return false;
+        }
+    }
+    return true;
+}
+
+bool TextExpander::addArgument(std::size_t index, Result& result) {
+    if (!arguments_[index].mayHaveMacros && !watches_) {
+        return add(arguments_[index].raw, result);
+    }
+    if (!arguments_[index].isExpanded) {
+        Result expansion{takeBuffer()};
+        if (!read(arguments_[index].raw, Place::Argument, expansion)) {
+            return false;
+        }
+        ArgumentText& argument = arguments_[index];
+        argument.expansion = expansion.text.view();
+        argument.hasMacros = expansion.hasMacros;
+        argument.isExpanded = true;
+    }
+    const ArgumentText& argument = arguments_[index];
+    work_ += argument.expansion.size();
+    result.hasMacros = result.hasMacros || argument.hasMacros;
+    return work_ <= kMostWork && add(argument.expansion, result);
+}
+
+bool TextExpander::addJoined(const MacroBody& body, const BodyStep& step, std::size_t firstArgument,
+                             Result& result) {
+    TextBuffer& joined = takeBuffer();
+    for (std::size_t index = step.first; index < step.last; ++index) {
+        const BodyOperand operand = body.operands[index];
+        if (operand.kind == BodyOperand::Kind::Token) {
+            joined.append(body.tokens->text(operand.index));
+        } else if (operand.kind == BodyOperand::Kind::RawArgument) {
+            joined.append(arguments_[firstArgument + operand.index].raw);
+        } else {
+            literal_.clear();
+            stringize(arguments_[firstArgument + operand.index].raw, literal_);
+            joined.append(literal_);
+        }
+    }
+    work_ += joined.view().size();
+    return work_ <= kMostWork && isPlain(joined.view(), result) && add(joined.view(), result);
+}
+
+// Tells whether a joined text yields tokens of text only, and notes whether there are names of
+// macros among them.
+bool TextExpander::isPlain(std::string_view text, Result& result) {
+    const char* const end = text.data() + text.size();
+    const char* at = text.data();
+    while (at != nullptr && at < end) {
+        if (isNameStart(*at)) {
+            const char* const behind = plainNameEnd(at);
+            result.hasMacros = result.hasMacros || macroOf(viewOf(at, behind)) != nullptr;
+            at = behind;
+        } else {
+            at = unusualTokenEnd(at, end);
+        }
+    }
+    return at != nullptr;
+}
+
+// Adds a text, unless the bytes that meet there may belong to one token.
+bool TextExpander::add(std::string_view text, Result& result) {
+    if (text.empty()) {
+        return true;
+    }
+    if (!result.isWritten && !result.text.empty() && mayMeet(result.text.back(), text.front())) {
+        return false;
+    }
+    result.text.append(text);
+    return true;
+}
+
+bool TextExpander::hasMacros(const MacroBody& body) {
+    bool any = false;
+    for (const Name* const name : body.names) {
+        if (watches_) {
+            macros_.watch(name->text);
+        }
+        any = any || name->isDefined;
+    }
+    return any;
+}
+
+// Returns the macro of this name, or null.
+const MacroName* TextExpander::macroOf(std::string_view name) {
+    if (watches_) {
+        macros_.watch(name);
+    }
+    return macros_.filter().mayHold(name) && name != "defined" ? macros_.find(name) : nullptr;
+}
+
+bool TextExpander::isAround(const MacroName& name) const {
+    return std::find(around_.begin(), around_.end(), &name) != around_.end();
+}
+
+// Returns an empty text for use until the call that is replaced has been.
+TextBuffer& TextExpander::takeBuffer() {
+    if (buffersUsed_ == buffers_.size()) {
+        buffers_.push_back(std::make_unique<TextBuffer>());
+    }
+    TextBuffer& buffer = *buffers_[buffersUsed_];
+    ++buffersUsed_;
+    buffer.clear();
+    return buffer;
+}
+
+}  // namespace umpre

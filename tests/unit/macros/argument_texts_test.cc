@@ -1,0 +1,69 @@
+// SPDX-License-Identifier: MIT
+#include "macros/argument_texts.h"
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+namespace umpre {
+namespace {
+
+// Returns the arguments found, each in brackets, with "!" where one may have macros, and the rest
+// of the text.
+[[nodiscard]] std::string argumentsOf(std::string_view text, std::size_t count) {
+    NameFilter names;
+    names.add("N");
+    std::vector<ArgumentText> arguments;
+    const char* const end = text.data() + text.size();
+    const char* const behind = takeArgumentTexts(text.data(), end, count, names, arguments);
+    if (behind == nullptr) {
+        return "(not told)";
+    }
+    std::string result;
+    for (const ArgumentText& argument : arguments) {
+        result.append("[").append(argument.raw).append(argument.mayHaveMacros ? "]!" : "]");
+    }
+    return result.append(behind, end);
+}
+
+TEST(ArgumentTexts, AreFound) {
+    struct Row {
+        std::string_view text;
+        std::size_t count;
+        std::string_view arguments;
+    };
+
+    const std::vector<Row> rows{
+        {"()", 0, ""},
+        {"( \t) rest", 0, " rest"},
+        {"(a)", 1, "[a]"},
+        {"(a,)", 1, "[a]"},
+        {"(,)", 1, "[]"},
+        {"( a + 1 , b )c", 2, "[a + 1][b]c"},
+        {"(a\t,\t b  )", 2, "[a][b]"},
+        {"((a, b), (c))", 2, "[(a, b)][(c)]"},
+        {"([a,b])", 2, "[[a][b]]"},
+        {"(\"a,b)\", '(')", 2, "[\"a,b)\"]['(']"},
+        {"(N, a N1, x + N)", 3, "[N]![a N1][x + N]!"},
+        {"(1N, 0x1N)", 2, "[1N]![0x1N]!"},
+        {"(a / b, \\)", 2, "[a / b][\\]"},
+    };
+    for (const Row& row : rows) {
+        EXPECT_EQ(argumentsOf(row.text, row.count), row.arguments) << row.text;
+    }
+}
+
+TEST(ArgumentTexts, AreLeftIfBytesDoNotTell) {
+    for (const std::string_view text :
+         {"(",         "(a",        "(a,",      "(a, b",      "(a, (b)",     "()",
+          "(a)",       "(a,)",      "(,)",      "(a, b, c)",  "(a, b,)x,",   "(a  b, c)",
+          "(a\tb, c)", "(a\nb, c)", "(\na, c)", "(a, b\n)",   "(a /**/, b)", "(a, b//)",
+          "(a, \")",   "(a, ')",    "(a, '')",  "(a, b\\\n)", "(a, \r)"}) {
+        EXPECT_EQ(argumentsOf(text, 2), text == "(a, b,)x," ? "[a][b]x," : "(not told)") << text;
+    }
+}
+
+}  // namespace
+}  // namespace umpre
