@@ -21,6 +21,9 @@ class CppFileScanner final : public CppScanner {
 public:
     explicit CppFileScanner(CommentSink& commentSink, const RunOptions& options = {});
 
+    /// Sets how many bytes are held at a time, about, of what is opened next.
+    void setWindowSize(std::size_t size) { input_.setWindowSize(size); }
+
     /// Opens a file, or standard input, called "stdin", if the name is empty. Returns false if it
     /// cannot be opened; the scanner must then not be read.
     [[nodiscard]] bool open(const std::string& fileName);

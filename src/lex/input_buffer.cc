@@ -96,12 +96,21 @@ void InputBuffer::close() {
     if (owned_) {
         ::close(descriptor_);
     }
+    dropLargeMemory();
+    reset();
+}
+
+void InputBuffer::setWindowSize(std::size_t size) {
+    windowSize_ = size;
+    dropLargeMemory();
+}
+
+void InputBuffer::dropLargeMemory() {
     if (capacity_ > 2 * windowSize_) {
         data_.reset();
         begin_ = nullptr;
         capacity_ = 0;
     }
-    reset();
 }
 
 void InputBuffer::reset() {

@@ -38,6 +38,9 @@ public:
 
     ~InputBuffer() { close(); }
 
+    /// Sets how many bytes are held at a time, about, in what is opened next. It is now closed.
+    void setWindowSize(std::size_t size);
+
     /// Opens a file and keeps it open until `close`. Returns false if there is none, if it cannot
     /// be read, or if it is a directory. A regular file ends where it ended at this moment.
     [[nodiscard]] bool openFile(const std::string& name);
@@ -73,6 +76,7 @@ public:
 
 private:
     void reset();
+    void dropLargeMemory();
     void reserve(std::size_t capacity);
     [[nodiscard]] bool hasCome(Need need, std::size_t kept, std::size_t& searched);
     [[nodiscard]] bool findLimit(std::size_t& searched);

@@ -20,6 +20,11 @@ namespace {
 // Sources kept for use again; more of them are open at a time only in deep nesting.
 constexpr std::size_t kSpares = 64;
 
+// Files that are open inside so many others are read in narrow windows: there may be as many as
+// there can be descriptors.
+constexpr std::size_t kWideFiles = 32;
+constexpr std::size_t kNarrowWindow = 2048;
+
 }  // namespace
 
 ScannerStack::ScannerStack(FileEvents& events, OutputWriter& output, Reporter& reporter,
@@ -108,6 +113,8 @@ bool ScannerStack::pushFile(const std::string& fileName, std::string_view messag
         file = std::move(spareFiles_.back());
         spareFiles_.pop_back();
     }
+    file->setWindowSize(files_.size() < kWideFiles ? options_.windowSize
+                                                   : std::min(options_.windowSize, kNarrowWindow));
     if (!file->open(fileName)) {
         spareFiles_.push_back(std::move(file));
         return false;

@@ -227,6 +227,24 @@ TEST(InputBuffer, KeepsWindowsSmallWhenLinesAreShort) {
     }
 }
 
+TEST(InputBuffer, TakesAnotherWindowSize) {
+    const TemporaryDirectory directory;
+    std::string text;
+    for (int line = 0; line < 10'000; ++line) {
+        text += "line\n";
+    }
+    const std::string name = directory.write("file", text);
+    InputBuffer input({.windowSize = 65'536});
+    for (const std::size_t size : {65'536U, 256U, 65'536U}) {
+        input.setWindowSize(size);
+        ASSERT_TRUE(input.openFile(name));
+        const std::vector<std::string> windows = windowsOf(input);
+        EXPECT_EQ(windows.size() == 1, size > text.size());
+        EXPECT_LE(windows.front().size(), 4 * size);
+        input.close();
+    }
+}
+
 TEST(InputBuffer, HasNothingInAnEmptyInput) {
     const TemporaryDirectory directory;
     const std::string name = directory.write("empty", "");
