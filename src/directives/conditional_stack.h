@@ -28,6 +28,12 @@ public:
     /// Tells whether lines are being skipped.
     [[nodiscard]] bool skipping() const noexcept { return innermost_.skipping; }
 
+    /// Tells whether the innermost group of the current file lies in skipped text: none of its
+    /// branches becomes active, and behind its end skipping goes on.
+    [[nodiscard]] bool isDead() const noexcept {
+        return conditionalDepth_ > 0 && enclosing_.back().skipping;
+    }
+
     /// Opens a group: a dead one in skipped text, otherwise one whose condition `decide` gives.
     void open();
     /// Says whether the branch that begins is taken.

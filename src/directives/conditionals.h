@@ -35,6 +35,9 @@ public:
     /// Tells whether lines are being skipped.
     [[nodiscard]] bool skipping() const noexcept { return groups_.skipping(); }
 
+    /// Returns the open groups, for a reader of skipped lines.
+    [[nodiscard]] ConditionalStack& groups() noexcept { return groups_; }
+
     /// Carries out the directive of this word, which was just read. Returns false if it is not a
     /// conditional one.
     bool carryOut(TokenKind word);

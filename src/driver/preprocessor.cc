@@ -25,7 +25,7 @@ Preprocessor::Preprocessor(DiagnosticSink diagnostics, const RunOptions& options
       inclusion_(sources_, expander_, lexer_, macros_, files_, diagnostics_),
       lineControl_(sources_, expander_, lexer_, output_, diagnostics_),
       textReader_(output_, macros_.filter()),
-      lineSkipper_(output_) {
+      lineSkipper_(output_, conditionals_.groups()) {
     definePredefinedMacros(macros_);
 }
 

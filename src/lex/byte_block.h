@@ -11,37 +11,72 @@
 
 namespace umpre {
 
-/// 64 bytes looked at together. What it tells comes as a mask: bit N stands for byte N.
-class ByteBlock {
+/// 16 bytes looked at together, with what every processor of the kind has.
+struct BaseVector {
+    using Bytes = simde__m128i;
+
+    static constexpr std::size_t kSize = sizeof(Bytes);
+
+    [[nodiscard]] static Bytes load(const char* at) noexcept { return simde_mm_loadu_si128(at); }
+
+    static void store(char* at, Bytes bytes) noexcept { simde_mm_storeu_si128(at, bytes); }
+
+    [[nodiscard]] static Bytes all(char byte) noexcept { return simde_mm_set1_epi8(byte); }
+
+    [[nodiscard]] static Bytes equal(Bytes some, Bytes others) noexcept {
+        return simde_mm_cmpeq_epi8(some, others);
+    }
+
+    /// Compares signed numbers.
+    [[nodiscard]] static Bytes less(Bytes some, Bytes others) noexcept {
+        return simde_mm_cmplt_epi8(some, others);
+    }
+
+    [[nodiscard]] static Bytes difference(Bytes some, Bytes others) noexcept {
+        return simde_mm_sub_epi8(some, others);
+    }
+
+    [[nodiscard]] static Bytes either(Bytes some, Bytes others) noexcept {
+        return simde_mm_or_si128(some, others);
+    }
+
+    /// Returns the highest bit of each byte.
+    [[nodiscard]] static std::uint32_t bits(Bytes bytes) noexcept {
+        return static_cast<std::uint32_t>(simde_mm_movemask_epi8(bytes));
+    }
+};
+
+/// 64 bytes looked at together, or fewer. What it tells comes as a mask: bit N stands for byte N.
+template <typename Vector, std::size_t kBytes = 64>
+class BasicByteBlock {
 public:
     using Mask = std::uint64_t;
 
-    static constexpr std::size_t kSize = 64;
+    static constexpr std::size_t kSize = kBytes;
 
-    /// Takes the 64 bytes from `at`.
-    explicit ByteBlock(const char* at) noexcept
-        : first_(simde_mm_loadu_si128(at)),
-          second_(simde_mm_loadu_si128(at + 16)),
-          third_(simde_mm_loadu_si128(at + 32)),
-          fourth_(simde_mm_loadu_si128(at + 48)) {}
+    /// Takes the bytes from `at`.
+    explicit BasicByteBlock(const char* at) noexcept {
+        for (std::size_t part = 0; part < kParts; ++part) {
+            parts_[part] = Vector::load(at + part * Vector::kSize);
+        }
+    }
 
-    /// Takes the bytes from `at` up to `end`; if these are fewer than 64, zero bytes behind them.
-    [[nodiscard]] static ByteBlock between(const char* at, const char* end) noexcept {
+    /// Takes the bytes from `at` up to `end`; if these are fewer, zero bytes behind them.
+    [[nodiscard]] static BasicByteBlock between(const char* at, const char* end) noexcept {
         const auto size = static_cast<std::size_t>(end - at);
         if (size >= kSize) {
-            return ByteBlock(at);
+            return BasicByteBlock(at);
         }
         std::array<char, kSize> bytes{};
         std::memcpy(bytes.data(), at, size);
-        return ByteBlock(bytes.data());
+        return BasicByteBlock(bytes.data());
     }
 
-    /// Writes the 64 bytes to `at`.
+    /// Writes the bytes to `at`.
     void copyTo(char* at) const noexcept {
-        simde_mm_storeu_si128(at, first_);
-        simde_mm_storeu_si128(at + 16, second_);
-        simde_mm_storeu_si128(at + 32, third_);
-        simde_mm_storeu_si128(at + 48, fourth_);
+        for (std::size_t part = 0; part < kParts; ++part) {
+            Vector::store(at + part * Vector::kSize, parts_[part]);
+        }
     }
 
     /// Returns where any of some bytes stand.
@@ -51,19 +86,19 @@ public:
     }
 
     /// Returns where both blocks have the same bytes.
-    [[nodiscard]] Mask same(const ByteBlock& other) const noexcept {
-        const auto bits = [](Part part, Part otherPart) noexcept {
-            const int mask = simde_mm_movemask_epi8(simde_mm_cmpeq_epi8(part, otherPart));
-            return static_cast<Mask>(static_cast<unsigned>(mask));
-        };
-        return bits(first_, other.first_) | bits(second_, other.second_) << 16U
-               | bits(third_, other.third_) << 32U | bits(fourth_, other.fourth_) << 48U;
+    [[nodiscard]] Mask same(const BasicByteBlock& other) const noexcept {
+        Mask mask = 0;
+        for (std::size_t part = 0; part < kParts; ++part) {
+            const Part isSame = Vector::equal(parts_[part], other.parts_[part]);
+            mask |= Mask{Vector::bits(isSame)} << part * Vector::kSize;
+        }
+        return mask;
     }
 
     /// Returns where ASCII letters and underscores stand.
     [[nodiscard]] Mask letters() const noexcept {
         return maskOf([](Part part) noexcept {
-            const Part lower = simde_mm_or_si128(part, simde_mm_set1_epi8(0x20));
+            const Part lower = Vector::either(part, Vector::all(0x20));
             return either(within<'a', 26>(lower), equal(part, '_'));
         });
     }
@@ -74,46 +109,46 @@ public:
 
     /// Returns where blanks, control characters and bytes above 127 stand.
     [[nodiscard]] Mask blanksAndUnusual() const noexcept {
-        return maskOf([](Part part) noexcept {
-            return simde_mm_cmplt_epi8(part, simde_mm_set1_epi8(' ' + 1));
-        });
+        return maskOf([](Part part) noexcept { return Vector::less(part, Vector::all(' ' + 1)); });
     }
 
 private:
-    using Part = simde__m128i;
+    using Part = typename Vector::Bytes;
+
+    static constexpr std::size_t kParts = kSize / Vector::kSize;
 
     [[nodiscard]] static Part equal(Part part, char byte) noexcept {
-        return simde_mm_cmpeq_epi8(part, simde_mm_set1_epi8(byte));
+        return Vector::equal(part, Vector::all(byte));
     }
 
     [[nodiscard]] static Part either(Part only) noexcept { return only; }
 
     template <typename... Parts>
     [[nodiscard]] static Part either(Part first, Parts... others) noexcept {
-        return simde_mm_or_si128(first, either(others...));
+        return Vector::either(first, either(others...));
     }
 
     // Comparisons are signed: the range is moved to where the smallest numbers are.
     template <char kFirst, int kCount>
     [[nodiscard]] static Part within(Part part) noexcept {
         const Part moved =
-            simde_mm_sub_epi8(part, simde_mm_set1_epi8(static_cast<char>(kFirst + INT8_MIN)));
-        return simde_mm_cmplt_epi8(moved, simde_mm_set1_epi8(INT8_MIN + kCount));
+            Vector::difference(part, Vector::all(static_cast<char>(kFirst + INT8_MIN)));
+        return Vector::less(moved, Vector::all(INT8_MIN + kCount));
     }
 
     template <typename Test>
     [[nodiscard]] Mask maskOf(Test test) const noexcept {
-        const auto bits = [&test](Part part) noexcept {
-            return static_cast<Mask>(static_cast<unsigned>(simde_mm_movemask_epi8(test(part))));
-        };
-        return bits(first_) | bits(second_) << 16U | bits(third_) << 32U | bits(fourth_) << 48U;
+        Mask mask = 0;
+        for (std::size_t part = 0; part < kParts; ++part) {
+            mask |= Mask{Vector::bits(test(parts_[part]))} << part * Vector::kSize;
+        }
+        return mask;
     }
 
-    Part first_;
-    Part second_;
-    Part third_;
-    Part fourth_;
+    Part parts_[kParts];  // NOLINT(*-avoid-c-arrays): std::array's functions are everybody's
 };
+
+using ByteBlock = BasicByteBlock<BaseVector>;
 
 /// Returns the place of the lowest bit of a mask that has one.
 [[nodiscard]] inline unsigned firstBit(ByteBlock::Mask mask) noexcept {

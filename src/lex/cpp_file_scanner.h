@@ -13,6 +13,7 @@
 #include "lex/output_writer.h"
 #include "lex/snippet.h"
 #include "lex/source_position.h"
+#include "lex/text_map.h"
 
 namespace umpre {
 
@@ -84,6 +85,9 @@ public:
 
     /// Returns the finder of literals among the bytes ahead.
     [[nodiscard]] LiteralFinder& literals() noexcept { return lexer_.literals(); }
+
+    /// Returns the map of the bytes ahead.
+    [[nodiscard]] TextMap& textMap() noexcept { return lexer_.textMap(); }
 
     /// Passes over bytes ahead, up to the beginning of a token, `lines` line ends among them.
     void advance(std::size_t bytes, std::size_t lines, bool endsWithLineEnd);

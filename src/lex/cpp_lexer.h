@@ -15,6 +15,7 @@
 #include "lex/input_buffer.h"
 #include "lex/literal.h"
 #include "lex/run_options.h"
+#include "lex/text_map.h"
 #include "lex/token.h"
 
 namespace umpre {
@@ -53,6 +54,9 @@ public:
     /// Returns the finder of literals among the bytes ahead.
     [[nodiscard]] LiteralFinder& literals() noexcept { return literals_; }
 
+    /// Returns the map of the bytes ahead.
+    [[nodiscard]] TextMap& textMap() noexcept { return textMap_; }
+
     /// Passes over bytes ahead, up to the beginning of a token, `lines` line ends among them.
     void advance(std::size_t bytes, std::size_t lines);
 
@@ -79,6 +83,7 @@ private:
     char* end_ = nullptr;           // of the bytes in memory
     char* limit_ = nullptr;         // of what can be scanned of them
     LiteralFinder literals_;
+    TextMap textMap_;
     bool plainRoad_;
     std::int32_t line_ = 1;
 };

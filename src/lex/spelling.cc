@@ -2,8 +2,12 @@
 #include "lex/spelling.h"
 
 #include <array>
+#include <bit>
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
+
+#include "lex/byte_block.h"
 
 namespace umpre {
 namespace {
@@ -12,14 +16,67 @@ using enum TokenKind;
 
 constexpr std::size_t kLongestWord = 7;
 
-// A word of up to eight bytes as a number.
+// A word of up to eight bytes as a number, the first byte in the lowest bits.
 [[nodiscard]] constexpr std::uint64_t packed(std::string_view word) noexcept {
     std::uint64_t bytes = 0;
-    for (const char byte : word) {
-        bytes = bytes << 8U | static_cast<unsigned char>(byte);
+    for (std::size_t at = word.size(); at > 0; --at) {
+        bytes = bytes << 8U | static_cast<unsigned char>(word[at - 1]);
     }
     return bytes;
 }
+
+// The same for two to eight bytes that may be read together.
+[[nodiscard]] std::uint64_t packedQuickly(std::string_view word) noexcept {
+    if constexpr (std::endian::native != std::endian::little) {
+        return packed(word);
+    }
+    const auto join = [word](auto part) {
+        const std::size_t rest = word.size() - sizeof(part);
+        std::memcpy(&part, word.data(), sizeof(part));
+        const std::uint64_t first = part;
+        std::memcpy(&part, word.data() + rest, sizeof(part));
+        return first | std::uint64_t{part} << 8 * rest;  // bytes that both hold are the same
+    };
+    return word.size() < sizeof(std::uint32_t) ? join(std::uint16_t{}) : join(std::uint32_t{});
+}
+
+// The words that are no identifiers, each in the place that its number leads to.
+struct Words {
+    struct Word {
+        std::uint64_t bytes = 0;
+        TokenKind kind = IDENTIFIER;
+    };
+
+    [[nodiscard]] static constexpr std::size_t placeOf(std::uint64_t bytes) noexcept {
+        return bytes * 0x44D565AD0A4E8BD5U >> 60U;  // found by trying: all places differ
+    }
+
+    constexpr void add(std::string_view word, TokenKind kind) {
+        Word& place = places[placeOf(packed(word))];
+        place = place.bytes == 0 ? Word{packed(word), kind} : throw kind;
+    }
+
+    std::array<Word, 16> places{};
+};
+
+constexpr Words kWords = [] {
+    Words words;
+    words.add("if", KW_IF);
+    words.add("ifdef", KW_IFDEF);
+    words.add("ifndef", KW_IFNDEF);
+    words.add("else", KW_ELSE);
+    words.add("elif", KW_ELIF);
+    words.add("endif", KW_ENDIF);
+    words.add("include", KW_INCLUDE);
+    words.add("define", KW_DEFINE);
+    words.add("undef", KW_UNDEF);
+    words.add("line", KW_LINE);
+    words.add("error", KW_ERROR);
+    words.add("pragma", KW_PRAGMA);
+    words.add("ident", KW_IDENT);
+    words.add("defined", KW_DEFINED);
+    return words;
+}();
 
 [[nodiscard]] bool isHexDigit(char byte) noexcept {
     const char lower = static_cast<char>(byte | 0x20);
@@ -80,25 +137,22 @@ constexpr std::array<TokenKind, 256> kSingles = [] {
 }  // namespace
 
 TokenKind kindOfName(std::string_view name) noexcept {
-    if (name.size() > kLongestWord) {
+    if (name.size() < 2 || name.size() > kLongestWord) {
         return IDENTIFIER;
     }
-    switch (packed(name)) {
-    case packed("if"): return KW_IF;
-    case packed("ifdef"): return KW_IFDEF;
-    case packed("ifndef"): return KW_IFNDEF;
-    case packed("else"): return KW_ELSE;
-    case packed("elif"): return KW_ELIF;
-    case packed("endif"): return KW_ENDIF;
-    case packed("include"): return KW_INCLUDE;
-    case packed("define"): return KW_DEFINE;
-    case packed("undef"): return KW_UNDEF;
-    case packed("line"): return KW_LINE;
-    case packed("error"): return KW_ERROR;
-    case packed("pragma"): return KW_PRAGMA;
-    case packed("ident"): return KW_IDENT;
-    case packed("defined"): return KW_DEFINED;
-    default: return IDENTIFIER;
+    const std::uint64_t bytes = packedQuickly(name);
+    const Words::Word& word = kWords.places[Words::placeOf(bytes)];
+    return word.bytes == bytes ? word.kind : IDENTIFIER;
+}
+
+const char* nameEndAhead(const char* at) noexcept {
+    using Block = BasicByteBlock<BaseVector, 16>;
+    for (;; at += Block::kSize) {
+        const Block block(at);
+        const auto others = ~(block.letters() | block.digits()) & bitsBelow(Block::kSize);
+        if (others != 0) {
+            return at + firstBit(others);
+        }
     }
 }
 

@@ -42,6 +42,9 @@ namespace umpre {
     return at;
 }
 
+/// The same where 16 bytes behind each byte of the name can be read.
+[[nodiscard]] const char* nameEndAhead(const char* at) noexcept;
+
 /// Returns the kind of a name: that of a directive word or of `defined`, or IDENTIFIER.
 [[nodiscard]] TokenKind kindOfName(std::string_view name) noexcept;
 

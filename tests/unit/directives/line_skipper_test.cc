@@ -1,5 +1,5 @@
 // SPDX-License-Identifier: MIT
-#include "lex/line_skipper.h"
+#include "directives/line_skipper.h"
 
 #include <array>
 #include <cstddef>
@@ -26,6 +26,8 @@ struct Skipping {
         isOpen = file.open(directory.write("main", text));
         output.redirect(sink);
         output.countLines(1);
+        groups.open();
+        groups.decide(false);
     }
 
     [[nodiscard]] const std::string& written() {
@@ -39,7 +41,8 @@ struct Skipping {
     bool isOpen = false;
     testing::RecordingSink sink;
     OutputWriter output;
-    LineSkipper skipper{output};
+    ConditionalStack groups;
+    LineSkipper skipper{output, groups};
 };
 
 // What is written for a text, and the text of the token that is left next.
@@ -79,17 +82,55 @@ TEST(LineSkipper, WritesALineFeedForEachLineOfAComment) {
 TEST(LineSkipper, StopsAtADirective) {
     expectSkips(
         {
-            {"#x\n", "", "#"},
-            {"a\n#x\n", "\n", "#"},
-            {"a\n  #x\n", "\n", "#"},
-            {"a\n/**/#x\n", "\n", "#"},
-            {"a\n /* \n */ /* */ #x\n", "\n\n", "#"},
-            {"a\n\\\n#x\n", "\n", "#"},
-            {"a\n \\\r\n /**/ #x\n", "\n", "#"},
-            {"a\n\r\n#x\n", "\n\n", "#"},
-            {"a\r#x\n", "\n", "#"},
+            {"#else\n", "", "#"},
+            {"a\n#else\n", "\n", "#"},
+            {"a\n  #else\n", "\n", "#"},
+            {"a\n/**/#else\n", "\n", "#"},
+            {"a\n /* \n */ /* */ #else\n", "\n\n", "#"},
+            {"a\n\\\n#else\n", "\n", "#"},
+            {"a\n \\\r\n /**/ #else\n", "\n", "#"},
+            {"a\n\r\n#else\n", "\n\n", "#"},
+            {"a\r#else\n", "\n", "#"},
+            {"a\n#elif 1\n", "\n", "#"},
+            {"a\n#endif\n", "\n", "#"},
+            {"a\n#\nb\n", "\n", "#"},
+            {"a\n# 1\nb\n", "\n", "#"},
+            {"a\n#if /*\n*/ 1\n", "\n", "#"},
         },
         Stop::LineStart);
+}
+
+TEST(LineSkipper, PassesOverWhatChangesNothing) {
+    expectSkips(
+        {
+            {"#define a \"/*\"\n # x # y\n#line\n", "\n\n\n", ""},
+            {"#if 1\n#else\na\n#endif\n", "\n\n\n", ""},
+            {"#ifdef a // b\n#endif\n#else\n", "", "#"},
+            {"#ifdef a\n#endif // b\n#else\n", "\n", "#"},
+            {"#if 1\n#ifndef a\n#endif x\n#elif 1\n#else\n#endif\n#endif\n", "\n\n\n", "#"},
+            {"#if 1\n#endif#endif\n", "", "#"},
+            {"#if 1\r\n#endif\r\n#else\n", "\n", "#"},
+        },
+        Stop::LineStart);
+}
+
+TEST(LineSkipper, LeavesWhatIsWrongInADeadGroup) {
+    for (const std::string_view wrong : {"#else\n", "#elif 1\n"}) {
+        Skipping skipping("#if 1\n#else\n" + std::string(wrong) + "#endif\n", 1024);
+        EXPECT_EQ(skipping.skipper.skip(skipping.file, Stop::LineStart), Stop::LineStart);
+        EXPECT_EQ(skipping.file.position().line, 3);
+        EXPECT_EQ(skipping.groups.conditionalDepth(), 2U);
+        EXPECT_EQ(skipping.groups.groupState(), GroupState::AfterElse);
+    }
+}
+
+TEST(LineSkipper, KeepsTheGroupsThatAreOpen) {
+    Skipping skipping("#if 1\n#ifdef a\n#endif\n#if 2\n#else\nb\n", 1024);
+    EXPECT_EQ(skipping.skipper.skip(skipping.file, Stop::LineStart), Stop::LineStart);
+    EXPECT_TRUE(skipping.file.isAtEnd());
+    EXPECT_EQ(skipping.groups.conditionalDepth(), 3U);
+    EXPECT_EQ(skipping.groups.groupState(), GroupState::AfterElse);
+    EXPECT_TRUE(skipping.groups.skipping());
 }
 
 TEST(LineSkipper, KnowsWhatIsNoDirective) {
@@ -106,7 +147,8 @@ TEST(LineSkipper, KnowsWhatIsNoDirective) {
 }
 
 TEST(LineSkipper, GoesOnWithinALine) {
-    expectSkips({{"#a\n#b\n", "\n", "#"}, {"\n#b\n", "\n", "#"}}, Stop::LineStart, Stop::InLine);
+    expectSkips({{"#else\n#else\n", "\n", "#"}, {"\n#else\n", "\n", "#"}}, Stop::LineStart,
+                Stop::InLine);
 }
 
 TEST(LineSkipper, LeavesALastLineThatHasNoLineEndToBeClosed) {
@@ -126,7 +168,7 @@ TEST(LineSkipper, LeavesALastLineThatHasNoLineEndToBeClosed) {
 }
 
 TEST(LineSkipper, LeavesWhatTheWindowDoesNotHoldToTheScanner) {
-    Skipping skipping("a\n/* b c d e f g */ #h\n", 8);
+    Skipping skipping("a\n/* b c d e f g */ #else\n", 8);
     EXPECT_EQ(skipping.skipper.skip(skipping.file, Stop::LineStart), Stop::LineStart);
     EXPECT_EQ(skipping.file.next().text, " ");
     const std::string literal = "\"" + std::string(100, 'c') + "\"";
@@ -136,10 +178,10 @@ TEST(LineSkipper, LeavesWhatTheWindowDoesNotHoldToTheScanner) {
 }
 
 TEST(LineSkipper, KeepsTheOutputInStep) {
-    Skipping skipping("a\nb\n\n#c\n", 1024);
+    Skipping skipping("a\nb\n\n#else\n", 1024);
     EXPECT_EQ(skipping.skipper.skip(skipping.file, Stop::LineStart), Stop::LineStart);
     EXPECT_TRUE(skipping.output.isAt(skipping.file.position()));
-    Skipping comment("/*\n*/\n#c\n", 1024);
+    Skipping comment("/*\n*/\n#else\n", 1024);
     EXPECT_EQ(comment.skipper.skip(comment.file, Stop::LineStart), Stop::LineStart);
     EXPECT_EQ(comment.file.position().line, 3);
     EXPECT_FALSE(comment.output.isAt(comment.file.position()));

@@ -1,0 +1,83 @@
+// SPDX-License-Identifier: MIT
+#ifndef UMPRE_LEX_TEXT_MASK_LOOP_H
+#define UMPRE_LEX_TEXT_MASK_LOOP_H
+
+#include <cstddef>
+
+#include "lex/byte_block.h"
+#include "lex/text_masks.h"
+
+namespace umpre {
+
+/// The work of a TextMaskFinder with one kind of vectors. If only some processors have these, the
+/// kind must be a type of one source file: then nothing that is made of it here is shared with
+/// other files. No function that others share may be called.
+template <typename Vector>
+class TextMaskLoop {
+public:
+    static void find(const char* bytes, std::size_t count, BytesBefore& before, TextMasks* masks) {
+        TextMaskLoop loop(before);
+        for (std::size_t index = 0; index < count; ++index) {
+            loop.findIn(bytes + index * Block::kSize, masks[index]);
+        }
+        before = {loop.lineFeeds_, loop.behindStar_ != 0, loop.escape_ != 0};
+    }
+
+private:
+    using Block = BasicByteBlock<Vector>;
+    using Mask = TextMasks::Mask;
+
+    static constexpr unsigned kLast = Block::kSize - 1;
+
+    explicit TextMaskLoop(const BytesBefore& before) noexcept
+        : lineFeeds_(before.lineFeeds),
+          behindStar_(before.endWithStar ? 1 : 0),
+          escape_(before.escape ? 1 : 0) {}
+
+    void findIn(const char* bytes, TextMasks& masks) noexcept {
+        const Block block(bytes);
+        const Mask slashes = block.any('/');
+        const Mask stars = block.any('*');
+        const Mask backslashes = block.any('\\');
+        const Mask lineFeeds = block.any('\n');
+        const Mask carriageReturns = block.any('\r');
+        const Mask singleQuotes = block.any('\'');
+        const Mask plain = ~escaped(backslashes);
+        constexpr Mask kUnknown = Mask{1} << kLast;
+        const Mask comments = slashes & ((slashes | stars) >> 1U | kUnknown);
+        masks.lineFeeds = lineFeeds;
+        masks.lineEnds = lineFeeds | carriageReturns;
+        masks.special = singleQuotes | carriageReturns | backslashes | comments | block.any('#');
+        masks.strings = Vector::parities(block.any('"') & plain);
+        masks.characterStops = (singleQuotes & plain) | masks.lineEnds;
+        masks.commentStops = (slashes & (stars << 1U | behindStar_)) | carriageReturns;
+        masks.lineFeedsBefore = lineFeeds_;
+        behindStar_ = stars >> kLast;
+        lineFeeds_ += Vector::count(lineFeeds);
+    }
+
+    // Returns what stands behind runs of backslashes of odd length. A run that begins at an even
+    // place and ends before an odd one is such, and the other way round.
+    [[nodiscard]] Mask escaped(Mask backslashes) noexcept {
+        constexpr Mask kEven = 0x5555555555555555U;
+        if ((backslashes | escape_) == 0) {
+            return 0;
+        }
+        const Mask first = escape_;
+        backslashes &= ~first;
+        const Mask starts = backslashes & ~(backslashes << 1U);
+        // The sums carry the beginnings of runs to their ends.
+        const Mask behindEven = backslashes + (starts & kEven);
+        const Mask behindOdd = backslashes + (starts & ~kEven);
+        escape_ = behindOdd < backslashes ? 1 : 0;
+        return first | (((behindEven & ~kEven) | (behindOdd & kEven)) & ~backslashes);
+    }
+
+    std::size_t lineFeeds_;
+    Mask behindStar_;
+    Mask escape_;
+};
+
+}  // namespace umpre
+
+#endif

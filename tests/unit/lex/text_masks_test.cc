@@ -1,0 +1,101 @@
+// SPDX-License-Identifier: MIT
+#include "lex/text_masks.h"
+
+#include <algorithm>
+#include <array>
+#include <cstddef>
+#include <random>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+namespace umpre {
+namespace {
+
+constexpr std::size_t kBlock = 64;
+
+// The masks as they are defined, found byte by byte.
+[[nodiscard]] std::vector<TextMasks> expectedMasks(std::string_view bytes) {
+    std::vector<TextMasks> found(bytes.size() / kBlock);
+    bool isEscaped = false;
+    bool isOdd = false;
+    std::size_t lineFeeds = 0;
+    for (std::size_t at = 0; at < bytes.size(); ++at) {
+        TextMasks& masks = found[at / kBlock];
+        const bool isLast = at % kBlock == kBlock - 1;
+        if (at % kBlock == 0) {
+            masks = {};
+            masks.lineFeedsBefore = lineFeeds;
+            isOdd = false;
+        }
+        const TextMasks::Mask bit = TextMasks::Mask{1} << at % kBlock;
+        const auto set = [bit](TextMasks::Mask& mask, bool isSet) { mask |= isSet ? bit : 0; };
+        const char byte = bytes[at];
+        const char next = isLast ? '/' : bytes[at + 1];
+        const char last = at == 0 ? ' ' : bytes[at - 1];
+        const bool isLineEnd = byte == '\n' || byte == '\r';
+        isOdd ^= byte == '"' && !isEscaped;
+        lineFeeds += byte == '\n' ? 1 : 0;
+        set(masks.lineFeeds, byte == '\n');
+        set(masks.lineEnds, isLineEnd);
+        set(masks.special, std::string_view("'\\#\r").find(byte) != std::string_view::npos
+                               || (byte == '/' && (next == '/' || next == '*')));
+        set(masks.strings, isOdd);
+        set(masks.characterStops, isLineEnd || (byte == '\'' && !isEscaped));
+        set(masks.commentStops, byte == '\r' || (byte == '/' && last == '*'));
+        isEscaped = byte == '\\' && !isEscaped;
+    }
+    return found;
+}
+
+[[nodiscard]] std::array<std::size_t, 7> numbersOf(const TextMasks& masks) {
+    return {masks.lineFeeds,      masks.lineEnds,     masks.special,        masks.strings,
+            masks.characterStops, masks.commentStops, masks.lineFeedsBefore};
+}
+
+[[nodiscard]] std::string soup(unsigned seed, std::size_t size) {
+    constexpr std::string_view kBytes = "\"\"'\\\\\\/*/*\n\n\r#ab 1\x80\xFF";
+    std::mt19937 random(seed);
+    std::string bytes(size, ' ');
+    for (char& byte : bytes) {
+        byte = kBytes[random() % kBytes.size()];
+    }
+    return bytes;
+}
+
+void expectMasks(TextMaskFinder finder, std::string_view bytes, std::size_t blocksTogether) {
+    std::vector<TextMasks> found(bytes.size() / kBlock);
+    BytesBefore before;
+    for (std::size_t at = 0; at < found.size(); at += blocksTogether) {
+        finder(bytes.data() + at * kBlock, std::min(blocksTogether, found.size() - at), before,
+               found.data() + at);
+    }
+    const std::vector<TextMasks> expected = expectedMasks(bytes);
+    for (std::size_t at = 0; at < found.size(); ++at) {
+        ASSERT_EQ(numbersOf(found[at]), numbersOf(expected[at])) << at;
+    }
+}
+
+TEST(TextMasks, SayWhatStandsWhere) {
+    for (unsigned seed = 0; seed < 50; ++seed) {
+        const std::string bytes = soup(seed, 16 * kBlock);
+        expectMasks(baseTextMaskFinder(), bytes, 1 + seed % 3);
+        expectMasks(textMaskFinder(), bytes, 1 + seed % 3);
+    }
+}
+
+TEST(TextMasks, FollowBackslashesOverBlocks) {
+    for (std::size_t first = 60; first < 68; ++first) {
+        for (std::size_t count = 1; count < 140; ++count) {
+            std::string bytes(4 * kBlock, ' ');
+            bytes.replace(first, count + 2, std::string(count, '\\') + "\"'");
+            expectMasks(baseTextMaskFinder(), bytes, 2);
+            expectMasks(textMaskFinder(), bytes, 2);
+        }
+    }
+}
+
+}  // namespace
+}  // namespace umpre
