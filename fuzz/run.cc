@@ -19,8 +19,8 @@
 namespace umpre::fuzz {
 namespace {
 
-constexpr std::size_t kMostOutput = std::size_t{64} * 1024;
-constexpr std::size_t kMostMemory = std::size_t{8} * 1024 * 1024;
+constexpr std::size_t kMostOutput = std::size_t{16} * 1024;
+constexpr std::size_t kMostMemory = std::size_t{1536} * 1024;
 constexpr std::size_t kMostFiles = 40;
 
 // Keeps what is written, up to a limit.

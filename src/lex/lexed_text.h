@@ -91,6 +91,7 @@ private:
         static constexpr std::uint64_t kNotable = 1U << 10U;
         static constexpr std::uint64_t kUnclean = 1U << 11U;
 
+        // cppcheck-suppress uninitMemberVar ; arrays grow by entries that are then written to
         Entry() = default;
 
         Entry(TokenKind kind, std::size_t end, Name* name) noexcept

@@ -134,9 +134,9 @@ void ScannerStack::pushFileText(const std::string& fileName, std::string_view te
 }
 
 void ScannerStack::enter(std::unique_ptr<CppFileScanner> file) {
-    currentSource_ = file.get();
-    sources_.push_back({file.get(), true});
     files_.push_back(std::move(file));
+    currentSource_ = files_.back().get();
+    sources_.push_back({currentSource_, true});
     events_.fileEntered();
 }
 
