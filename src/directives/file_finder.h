@@ -14,6 +14,7 @@
 #include <vector>
 
 #include "directives/include_form.h"
+#include "lex/file_bytes.h"
 #include "lex/file_identity.h"
 #include "lex/name_filter.h"
 #include "lex/no_expand_set.h"
@@ -33,6 +34,7 @@ struct KnownFile {
     /// if no such name is known.
     const Name* guard = nullptr;
     std::string guardedText;  ///< what comes out then, the file's first marker included
+    std::shared_ptr<FileBytes> bytes = nullptr;  ///< all of them, if they were kept
 
     /// Tells whether reading it now would write that text and do nothing else.
     [[nodiscard]] bool isGuarded() const noexcept { return guard != nullptr && guard->isDefined; }

@@ -23,13 +23,13 @@ void GuardWatch::fileEntered(std::shared_ptr<KnownFile> file) {
                        conditionals_.decisions(), actions_});
 }
 
-void GuardWatch::fileEnds(bool asExpected) {
-    const Pass pass = std::move(passes_.back());
+std::shared_ptr<KnownFile> GuardWatch::fileEnds(bool asExpected) {
+    Pass pass = std::move(passes_.back());
     passes_.pop_back();
     if (pass.file == nullptr || !asExpected || actions_ - pass.actions != 1
         || conditionals_.decisions() - pass.decisions != 1 || conditionals_.lastGuard() == nullptr
         || reporter_.reportCount() != pass.reports) {
-        return;
+        return std::move(pass.file);
     }
     const std::optional<std::size_t> lineFeeds = output_.lineFeedsSince(pass.begin);
     if (lineFeeds) {
@@ -37,6 +37,7 @@ void GuardWatch::fileEnds(bool asExpected) {
         pass.file->guardedText = OutputWriter::markerOf({pass.file->name, 1});
         pass.file->guardedText.append(*lineFeeds, '\n');
     }
+    return std::move(pass.file);
 }
 
 }  // namespace umpre

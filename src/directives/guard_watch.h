@@ -28,8 +28,8 @@ public:
     /// null.
     void fileEntered(std::shared_ptr<KnownFile> file);
     /// The file entered last has ended, and its groups are closed. `asExpected`: it was as long as
-    /// its size said.
-    void fileEnds(bool asExpected);
+    /// its size said. Returns what was given for the file.
+    std::shared_ptr<KnownFile> fileEnds(bool asExpected);
 
 private:
     struct Pass {

@@ -6,8 +6,10 @@
 namespace umpre {
 
 void IncludedFiles::open(std::string_view name, IncludeForm form, Search* search) {
-    if (search == nullptr || !passOver(*search)) {
+    if (search == nullptr) {
         enter(name, form);
+    } else if (!passOver(*search)) {
+        enter(*search);
     }
 }
 
@@ -16,6 +18,25 @@ void IncludedFiles::enter(std::string_view name, IncludeForm form) {
         guards_.fileEntered(finder_.entered());
     } else {
         reporter_.reportError(std::string("Cannot open file: ").append(name));
+    }
+}
+
+void IncludedFiles::enter(Search& search) {
+    if (!sources_.canOpenOneMore() || finder_.fileOf(search) == nullptr
+        || search.file->bytes == nullptr) {
+        enter(search.name, search.form);
+        return;
+    }
+    const std::shared_ptr<KnownFile> file = search.file;
+    sources_.pushKeptFile(file->name, file->bytes, file->identity);
+    guards_.fileEntered(file);
+}
+
+void IncludedFiles::fileEnds() {
+    const CppFileScanner& current = sources_.currentFile();
+    const std::shared_ptr<KnownFile> file = guards_.fileEnds(current.isReadWhole());
+    if (file != nullptr && file->bytes == nullptr && !file->isGuarded()) {
+        keeper_.keep(file, current.wholeText());
     }
 }
 

@@ -8,6 +8,7 @@
 
 #include "directives/conditionals.h"
 #include "directives/file_finder.h"
+#include "directives/file_keeper.h"
 #include "directives/guard_watch.h"
 #include "lex/no_expand_set.h"
 #include "lex/output_writer.h"
@@ -47,6 +48,8 @@ public:
     /// Looks for a file and enters it: a quoted name as it is first, then any name in the
     /// directories. Reports a file that is nowhere.
     void enter(std::string_view name, IncludeForm form);
+    /// Enters the file that a search leads to.
+    void enter(Search& search);
 
     /// Does what entering the file that a search leads to and reading it would do, if it would come
     /// out empty. Otherwise, or if that is not known, returns false with nothing done.
@@ -72,7 +75,7 @@ public:
     void noteAction() noexcept { guards_.noteAction(); }
 
     /// The current file, an included one, has ended, and its groups are closed.
-    void fileEnds() { guards_.fileEnds(sources_.currentFile().isReadWhole()); }
+    void fileEnds();
 
 private:
     ScannerStack& sources_;
@@ -80,6 +83,7 @@ private:
     Reporter& reporter_;
     FileFinder finder_;
     GuardWatch guards_;
+    FileKeeper keeper_;
 };
 
 }  // namespace umpre

@@ -42,7 +42,7 @@ bool Inclusion::includeLines(CppFileScanner& file) {
         file.advance(line->text.size(), 1, true);
         files_.noteAction();
         if (!files_.passOver(*line->search, line->passage)) {
-            files_.enter(line->search->name, line->search->form);
+            files_.enter(*line->search);
             break;
         }
         text.remove_prefix(line->text.size());

@@ -2,6 +2,7 @@
 #include "lex/cpp_file_scanner.h"
 
 #include <unistd.h>
+#include <utility>
 
 namespace umpre {
 
@@ -24,6 +25,13 @@ bool CppFileScanner::open(const std::string& fileName) {
 void CppFileScanner::openText(const std::string& fileName, std::string_view text) {
     setFileName(fileName);
     input_.openText(text);
+    start();
+}
+
+void CppFileScanner::openKept(const std::string& fileName, std::shared_ptr<FileBytes> bytes,
+                              const FileIdentity& identity) {
+    setFileName(fileName);
+    input_.openKept(std::move(bytes), identity);
     start();
 }
 

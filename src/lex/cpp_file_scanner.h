@@ -2,6 +2,7 @@
 #ifndef UMPRE_LEX_CPP_FILE_SCANNER_H
 #define UMPRE_LEX_CPP_FILE_SCANNER_H
 
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -30,6 +31,9 @@ public:
     [[nodiscard]] bool open(const std::string& fileName);
     /// Reads a text as if it were the file of that name.
     void openText(const std::string& fileName, std::string_view text);
+    /// Reads the bytes of a regular file that were kept, without opening it.
+    void openKept(const std::string& fileName, std::shared_ptr<FileBytes> bytes,
+                  const FileIdentity& identity);
     /// Closes the file; the scanner can open another one.
     void close();
 
@@ -79,6 +83,16 @@ public:
 
     /// Tells whether a regular file was read to its end and was as long as its size said.
     [[nodiscard]] bool isReadWhole() const noexcept { return input_.isReadWhole(); }
+
+    /// Returns all bytes of a regular file, if they were read and are all in memory; otherwise
+    /// nothing.
+    [[nodiscard]] std::string_view wholeText() const noexcept { return input_.wholeText(); }
+
+    /// Tells whether the file was kept and has no descriptor.
+    [[nodiscard]] bool lacksDescriptor() const noexcept { return input_.lacksDescriptor(); }
+
+    /// Takes a descriptor for a file that was kept, as if it were open.
+    void holdDescriptor() { input_.holdDescriptor(); }
 
     /// Returns how often bytes were waited for since this was last asked.
     [[nodiscard]] std::size_t takeWaits() noexcept { return input_.takeWaits(); }

@@ -26,11 +26,6 @@
 namespace umpre {
 namespace {
 
-// What the reader of several bytes at a time may read besides the bytes; the generated scanner
-// wants two of those behind to be zero.
-constexpr std::size_t kFront = 8;
-constexpr std::size_t kBack = 64;
-
 // Tells whether a token ends between two neighbours wherever they stand, comments and literals
 // aside.
 [[nodiscard]] bool isSplit(char before, char behind) noexcept {
@@ -92,6 +87,31 @@ void InputBuffer::openText(std::string_view text) {
     terminate();
 }
 
+void InputBuffer::openKept(std::shared_ptr<FileBytes> bytes, const FileIdentity& identity) {
+    close();
+    kept_ = std::move(bytes);
+    begin_ = kept_->begin();
+    filled_ = kept_->size();
+    limit_ = filled_;
+    sizeKnown_ = true;
+    identity_ = identity;
+}
+
+void InputBuffer::holdDescriptor() {
+    descriptor_ = ::open("/", O_PATH | O_CLOEXEC);
+    owned_ = descriptor_ >= 0;
+}
+
+std::string_view InputBuffer::wholeText() const noexcept {
+    const auto size = static_cast<std::size_t>(identity_.size);
+    const char* const end = begin_ + filled_;
+    if (kept_ != nullptr || !isReadWhole()
+        || static_cast<std::size_t>(end - data_.get()) != kBytesBefore + size) {
+        return {};
+    }
+    return {end - size, size};
+}
+
 void InputBuffer::close() {
     if (owned_) {
         ::close(descriptor_);
@@ -102,18 +122,19 @@ void InputBuffer::close() {
 
 void InputBuffer::setWindowSize(std::size_t size) {
     windowSize_ = size;
-    dropLargeMemory();
+    close();
 }
 
 void InputBuffer::dropLargeMemory() {
     if (capacity_ > 2 * windowSize_) {
         data_.reset();
-        begin_ = nullptr;
         capacity_ = 0;
     }
 }
 
 void InputBuffer::reset() {
+    kept_.reset();
+    begin_ = data_ == nullptr ? nullptr : data_.get() + kBytesBefore;
     filled_ = 0;
     limit_ = 0;
     descriptor_ = -1;
@@ -127,10 +148,12 @@ void InputBuffer::reset() {
 
 bool InputBuffer::refill(char*& position, Need need) {
     const auto kept = static_cast<std::size_t>(end() - position);
-    if (position != begin_) {
+    if (ended_) {
+        begin_ = position;  // nothing comes behind, and who was here first finds all as it was
+    } else if (position != begin_) {
         std::memmove(begin_, position, kept);
-        filled_ = kept;
     }
+    filled_ = kept;
     limit_ = 0;
     std::size_t searched = 0;
     // A comment or a literal that reached across the limit may have left something to scan.
@@ -211,7 +234,7 @@ void InputBuffer::terminate() {
     if (ended_) {
         limit_ = filled_;
     }
-    if (data_ == nullptr) {
+    if (begin_ == nullptr) {
         reserve(0);
     }
     std::memset(end(), 0, 2);
@@ -222,13 +245,13 @@ void InputBuffer::reserve(std::size_t capacity) {
         return;
     }
     // NOLINTNEXTLINE(cppcoreguidelines-no-malloc): realloc moves large windows without a copy
-    void* const memory = std::realloc(data_.get(), kFront + capacity + kBack);
+    void* const memory = std::realloc(data_.get(), kBytesBefore + capacity + kBytesBehind);
     if (memory == nullptr) {
         throw std::bad_alloc();
     }
     (void)data_.release();
     data_.reset(static_cast<char*>(memory));
-    begin_ = data_.get() + kFront;
+    begin_ = data_.get() + kBytesBefore;
     capacity_ = capacity;
 }
 

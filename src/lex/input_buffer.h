@@ -9,6 +9,7 @@
 #include <string_view>
 #include <utility>
 
+#include "lex/file_bytes.h"
 #include "lex/file_identity.h"
 #include "lex/run_options.h"
 
@@ -48,6 +49,17 @@ public:
     void openBorrowed(int descriptor);
     /// Reads a copy of a text.
     void openText(std::string_view text);
+    /// Reads the bytes of a regular file that were kept, without opening it.
+    void openKept(std::shared_ptr<FileBytes> bytes, const FileIdentity& identity);
+
+    /// Takes a descriptor for a file that was kept, as if it were open.
+    void holdDescriptor();
+
+    /// Tells whether a file is read that was kept and has no descriptor.
+    [[nodiscard]] bool lacksDescriptor() const noexcept {
+        return kept_ != nullptr && descriptor_ < 0;
+    }
+
     void close();
 
     [[nodiscard]] char* begin() noexcept { return begin_; }
@@ -71,6 +83,10 @@ public:
     /// Tells whether a regular file was read to its end and was as long as its size said.
     [[nodiscard]] bool isReadWhole() const noexcept { return sizeKnown_ && unread_ == 0; }
 
+    /// Returns all bytes of a regular file that is open, if it was read whole and they are all in
+    /// memory; otherwise nothing.
+    [[nodiscard]] std::string_view wholeText() const noexcept;
+
     /// Returns how often bytes were waited for since this was last asked.
     [[nodiscard]] std::size_t takeWaits() noexcept { return std::exchange(waits_, 0); }
 
@@ -90,8 +106,9 @@ private:
     std::size_t windowSize_;
     bool splitsLines_;
     std::unique_ptr<char, Free> data_;
-    char* begin_ = nullptr;     // of the bytes, within the memory
-    std::size_t capacity_ = 0;  // without the bytes around it
+    std::shared_ptr<FileBytes> kept_;  // read instead of the memory
+    char* begin_ = nullptr;            // of the bytes, within the memory
+    std::size_t capacity_ = 0;         // without the bytes around it
     std::size_t filled_ = 0;
     std::size_t limit_ = 0;
     int descriptor_ = -1;

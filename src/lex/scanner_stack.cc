@@ -77,8 +77,10 @@ void ScannerStack::dropCurrent() {
     assert(!sources_.empty());
     currentSource_ = sources_.back().scanner;
     if (isFile) {
-        waits_ += files_.back()->takeWaits();
-        files_.back()->close();
+        CppFileScanner& file = *files_.back();
+        waits_ += file.takeWaits();
+        filesWithoutDescriptors_ -= file.lacksDescriptor() ? 1U : 0U;
+        file.close();
         if (spareFiles_.size() < kSpares) {
             spareFiles_.push_back(std::move(files_.back()));
         }
@@ -106,13 +108,10 @@ void ScannerStack::skipToEndOfLine() {
 }
 
 bool ScannerStack::pushFile(const std::string& fileName, std::string_view messageName) {
-    std::unique_ptr<CppFileScanner> file;
-    if (spareFiles_.empty()) {
-        file = std::make_unique<CppFileScanner>(commentSink(), options_);
-    } else {
-        file = std::move(spareFiles_.back());
-        spareFiles_.pop_back();
+    if (!canOpenOneMore()) {
+        holdDescriptors();
     }
+    std::unique_ptr<CppFileScanner> file = newFile();
     file->setWindowSize(files_.size() < kWideFiles ? options_.windowSize
                                                    : std::min(options_.windowSize, kNarrowWindow));
     if (!file->open(fileName)) {
@@ -125,6 +124,35 @@ bool ScannerStack::pushFile(const std::string& fileName, std::string_view messag
     enter(std::move(file));
     mostFiles_ = std::max(mostFiles_, files_.size());
     return true;
+}
+
+void ScannerStack::pushKeptFile(const std::string& fileName, std::shared_ptr<FileBytes> bytes,
+                                const FileIdentity& identity) {
+    assert(canOpenOneMore());
+    std::unique_ptr<CppFileScanner> file = newFile();
+    file->openKept(fileName, std::move(bytes), identity);
+    ++filesWithoutDescriptors_;
+    enter(std::move(file));
+}
+
+// More files are to be open at a time than ever. Whether there is a descriptor for one more must
+// not hang on how some of them are read.
+void ScannerStack::holdDescriptors() {
+    for (auto file = files_.rbegin(); filesWithoutDescriptors_ > 0; ++file) {
+        if ((*file)->lacksDescriptor()) {
+            (*file)->holdDescriptor();
+            --filesWithoutDescriptors_;
+        }
+    }
+}
+
+std::unique_ptr<CppFileScanner> ScannerStack::newFile() {
+    if (spareFiles_.empty()) {
+        return std::make_unique<CppFileScanner>(commentSink(), options_);
+    }
+    std::unique_ptr<CppFileScanner> file = std::move(spareFiles_.back());
+    spareFiles_.pop_back();
+    return file;
 }
 
 void ScannerStack::pushFileText(const std::string& fileName, std::string_view text) {

@@ -81,6 +81,9 @@ public:
     /// false, with nothing changed, if it cannot be opened. `messageName`, if not empty, replaces
     /// the name in messages and markers.
     [[nodiscard]] bool pushFile(const std::string& fileName, std::string_view messageName = {});
+    /// Does the same for a file whose bytes were kept. One more must be able to be opened.
+    void pushKeptFile(const std::string& fileName, std::shared_ptr<FileBytes> bytes,
+                      const FileIdentity& identity);
     /// Reads a text as if it were a file.
     void pushFileText(const std::string& fileName, std::string_view text);
     /// Reads pieces, taking them over; `pieces` must be restarted before it is used again.
@@ -149,7 +152,9 @@ private:
     [[nodiscard]] TokenKind peekBelow();
     [[nodiscard]] Token nextBelow();
     [[nodiscard]] std::string skipWhile(bool (*wanted)(TokenKind));
+    [[nodiscard]] std::unique_ptr<CppFileScanner> newFile();
     void enter(std::unique_ptr<CppFileScanner> file);
+    void holdDescriptors();
     [[nodiscard]] CppTokenScanner& pushList();
     void pop();
     void dropCurrent();
@@ -184,6 +189,7 @@ private:
     std::size_t commentEffects_ = 0;
     std::size_t waits_ = 0;
     std::size_t mostFiles_ = 0;  // open at a time
+    std::size_t filesWithoutDescriptors_ = 0;
 };
 
 }  // namespace umpre

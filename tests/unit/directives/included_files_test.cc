@@ -24,6 +24,14 @@ struct FilesFixture {
         files.open(name, IncludeForm::Brackets, files.find(name, IncludeForm::Brackets));
     }
 
+    // Reads the file that was entered, to its end.
+    void readFile() {
+        while (f.sources.next().kind != TokenKind::NEWLINE) {
+        }
+        files.fileEnds();
+        EXPECT_TRUE(f.sources.leaveEndedFile());
+    }
+
     testing::TemporaryDirectory directory;
     testing::DirectiveFixture f;
     Conditionals conditionals{f.sources, f.macros, f.expander, f.lexer, f.reporter};
@@ -129,6 +137,42 @@ TEST(IncludedFiles, PassesOverAFileWhoseMarkerIsLong) {
         EXPECT_EQ(i.f.written(), "#line 1 \"" + i.name + "\"\n\n\n#line 1 \"" + name + "\"\n");
         i.f.sink.clear();
     }
+}
+
+TEST(IncludedFiles, ReadsAFileFromWhatItKept) {
+    FilesFixture i;
+    for (int times = 0; times < 2; ++times) {
+        i.open("a.h");
+        i.readFile();
+    }
+    Search& search = *i.files.find("a.h", IncludeForm::Brackets);
+    ASSERT_NE(search.file->bytes, nullptr);
+    i.directory.write("one/a.h", "something else\n");
+    i.open("a.h");
+    EXPECT_EQ(i.f.sources.peek(), TokenKind::IDENTIFIER);
+    EXPECT_TRUE(i.f.sources.currentFile().lacksDescriptor());
+    i.readFile();
+    i.f.reporter.reportError("a message");
+    i.open("a.h");
+    EXPECT_FALSE(i.f.sources.currentFile().lacksDescriptor());
+    EXPECT_EQ(i.f.rest(), "something else\nmain\n");
+}
+
+TEST(IncludedFiles, OpensAFileThatItKeptWhereNoneWasOpenBefore) {
+    FilesFixture i;
+    for (int times = 0; times < 2; ++times) {
+        i.open("a.h");
+        i.readFile();
+    }
+    i.open("a.h");
+    EXPECT_TRUE(i.f.sources.currentFile().lacksDescriptor());
+    i.open("a.h");
+    EXPECT_FALSE(i.f.sources.currentFile().lacksDescriptor());
+}
+
+TEST(IncludedFiles, KeepsNothingOfAFileThatComesOutEmpty) {
+    EmptyFileFixture i;
+    EXPECT_EQ(i.files.find("a.h", IncludeForm::Brackets)->file->bytes, nullptr);
 }
 
 }  // namespace

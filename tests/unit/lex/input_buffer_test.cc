@@ -6,6 +6,7 @@
 #include <cstring>
 #include <fcntl.h>
 #include <fstream>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <unistd.h>
@@ -412,6 +413,72 @@ TEST(InputBuffer, LeavesABorrowedDescriptorOpen) {
     }
     pipe.write("b\n");
     EXPECT_EQ(pipe.read(), "b\n");
+}
+
+TEST(InputBuffer, HasTheWholeTextOfAFileThatFitsIntoAWindow) {
+    const TemporaryDirectory directory;
+    const std::string name = directory.write("file", "one\ntwo\n");
+    for (const std::size_t windowSize : kWindowSizes) {
+        InputBuffer input({.windowSize = windowSize});
+        ASSERT_TRUE(input.openFile(name));
+        EXPECT_EQ(input.wholeText(), "");
+        EXPECT_EQ(joined(windowsOf(input)), "one\ntwo\n");
+        EXPECT_EQ(input.wholeText(), windowSize < 8 ? "" : "one\ntwo\n") << windowSize;
+        input.close();
+        EXPECT_EQ(input.wholeText(), "");
+    }
+}
+
+TEST(InputBuffer, HasNoWholeTextOfWhatIsNoFile) {
+    InputBuffer input({.windowSize = 64});
+    EXPECT_EQ(input.wholeText(), "");
+    input.openText("text\n");
+    EXPECT_EQ(joined(windowsOf(input)), "text\n");
+    EXPECT_EQ(input.wholeText(), "");
+    const Pipe pipe("piped\n");
+    input.openBorrowed(pipe.readEnd());
+    EXPECT_EQ(joined(windowsOf(input)), "piped\n");
+    EXPECT_EQ(input.wholeText(), "");
+}
+
+TEST(InputBuffer, GivesKeptBytesToAnyNumberOfReaders) {
+    const auto bytes = std::make_shared<FileBytes>("one\ntwo\n");
+    FileIdentity identity;
+    identity.size = 8;
+    InputBuffer outer({.windowSize = 64});
+    InputBuffer inner({.windowSize = 64});
+    outer.openKept(bytes, identity);
+    char* position = outer.begin();
+    ASSERT_TRUE(outer.refill(position, Need::Tokens));
+    for (int times = 0; times < 2; ++times) {
+        inner.openKept(bytes, identity);
+        EXPECT_EQ(inner.identity(), identity);
+        EXPECT_TRUE(inner.isReadWhole());
+        EXPECT_EQ(joined(windowsOf(inner)), "one\ntwo\n");
+        EXPECT_EQ(inner.wholeText(), "");
+    }
+    EXPECT_EQ(std::string_view(position, outer.limit()), "one\ntwo\n");
+    inner.openText("text");
+    EXPECT_EQ(joined(windowsOf(inner)), "text");
+}
+
+TEST(InputBuffer, TakesADescriptorForKeptBytesWhenTold) {
+    const auto nextDescriptor = [] {
+        const int descriptor = ::dup(STDERR_FILENO);
+        ::close(descriptor);
+        return descriptor;
+    };
+    const int before = nextDescriptor();
+    InputBuffer input({.windowSize = 64});
+    EXPECT_FALSE(input.lacksDescriptor());
+    input.openKept(std::make_shared<FileBytes>("text\n"), {});
+    EXPECT_TRUE(input.lacksDescriptor());
+    EXPECT_EQ(nextDescriptor(), before);
+    input.holdDescriptor();
+    EXPECT_FALSE(input.lacksDescriptor());
+    EXPECT_GT(nextDescriptor(), before);
+    input.close();
+    EXPECT_EQ(nextDescriptor(), before);
 }
 
 TEST(InputBuffer, CanBeUsedAgain) {

@@ -424,5 +424,60 @@ TEST(ScannerStack, CanOpenAsManyFilesAsWereOpen) {
     EXPECT_FALSE(f.sources.canOpenOneMore());
 }
 
+TEST(ScannerStack, ReadsAFileThatWasKept) {
+    const testing::TemporaryDirectory directory;
+    const std::string name = directory.write("a.h", "a");
+    testing::SourceFixture f("rest\n");
+    ASSERT_TRUE(f.sources.pushFile(name));
+    (void)f.sources.next();
+    EXPECT_EQ(f.sources.next().kind, TokenKind::NEWLINE);
+    EXPECT_TRUE(f.sources.leaveEndedFile());
+    f.sources.pushKeptFile("kept", std::make_shared<FileBytes>("kept\n"), {});
+    EXPECT_EQ(f.sources.position().fileName, "kept");
+    EXPECT_EQ(f.rest(), "kept\nrest\n");
+    EXPECT_EQ(f.fileEvents.events(), "+main +" + name + " -" + name + " =main +kept -kept =main");
+}
+
+TEST(ScannerStack, ReadsAKeptFileInsideItself) {
+    const testing::TemporaryDirectory directory;
+    const std::string name = directory.write("a.h", "");
+    testing::SourceFixture f("rest\n");
+    ASSERT_TRUE(f.sources.pushFile(name));
+    ASSERT_TRUE(f.sources.pushFile(name));
+    EXPECT_TRUE(f.sources.leaveEndedFile());
+    EXPECT_TRUE(f.sources.leaveEndedFile());
+    const auto bytes = std::make_shared<FileBytes>("one two\nthree // c\n");
+    f.sources.pushKeptFile("kept", bytes, {});
+    EXPECT_EQ(f.sources.next().text, "one");
+    f.sources.pushKeptFile("kept", bytes, {});
+    EXPECT_EQ(f.rest(), "one two\nthree  \n two\nthree  \nrest\n");
+}
+
+TEST(ScannerStack, KeptFilesTakeDescriptorsBeforeMoreFilesAreOpenThanEver) {
+    const testing::TemporaryDirectory directory;
+    const std::string name = directory.write("a.h", "");
+    testing::SourceFixture f("rest\n");
+    const auto nextDescriptor = [] {
+        const int descriptor = ::dup(STDERR_FILENO);
+        ::close(descriptor);
+        return descriptor;
+    };
+    const int before = nextDescriptor();
+    ASSERT_TRUE(f.sources.pushFile(name));
+    ASSERT_TRUE(f.sources.pushFile(name));
+    EXPECT_TRUE(f.sources.leaveEndedFile());
+    EXPECT_TRUE(f.sources.leaveEndedFile());
+    EXPECT_EQ(nextDescriptor(), before);
+    const auto bytes = std::make_shared<FileBytes>("kept\n");
+    f.sources.pushKeptFile("kept", bytes, {});
+    f.sources.pushKeptFile("kept", bytes, {});
+    EXPECT_EQ(nextDescriptor(), before);
+    EXPECT_FALSE(f.sources.canOpenOneMore());
+    ASSERT_TRUE(f.sources.pushFile(name));
+    EXPECT_EQ(nextDescriptor(), before + 3);
+    EXPECT_EQ(f.rest(), "kept\nkept\nrest\n");
+    EXPECT_EQ(nextDescriptor(), before);
+}
+
 }  // namespace
 }  // namespace umpre
