@@ -189,9 +189,15 @@ private:
 
 void noteNames(MacroBody& body) {
     const LexedText& tokens = *body.tokens;
-    for (std::size_t index = 0; index < tokens.size(); ++index) {
-        if (isName(tokens.kind(index))) {
-            body.names.push_back(tokens.name(index));
+    for (BodyStep& step : body.steps) {
+        if (step.kind == BodyStep::Kind::Tokens) {
+            step.firstName = body.names.size();
+            for (std::size_t index = step.first; index < step.last; ++index) {
+                if (isName(tokens.kind(index))) {
+                    body.names.push_back(tokens.name(index));
+                }
+            }
+            step.lastName = body.names.size();
         }
     }
 }

@@ -27,6 +27,9 @@ struct BodyStep {
     Kind kind = Kind::Tokens;
     std::size_t first = 0;
     std::size_t last = 0;  // not included
+    // For tokens, the names among them, of those of the body.
+    std::size_t firstName = 0;
+    std::size_t lastName = 0;
 };
 
 /// One text of those that a step joins.
@@ -48,7 +51,7 @@ struct MacroBody {
     LexedText source;  // the text as lexed, if reading it has effects
     std::vector<BodyStep> steps;
     std::vector<BodyOperand> operands;
-    std::vector<const Name*> names;  // of its own tokens
+    std::vector<const Name*> names;  // of the tokens that stay as they are
     /// Replacing is a matter of the bytes of this body and the arguments.
     bool isPlain = false;
 };

@@ -6,15 +6,27 @@
 #include <cstdint>
 #include <cstring>
 #include <string_view>
+#include <vector>
 
 #include "lex/growing_array.h"
 
 namespace umpre {
 
-/// A text that grows by short parts, which are copied without a call.
+/// A text that grows by short parts, which are copied without a call, and which of its parts are
+/// settled: no macros are left in them. Where a part ends, a token ends.
 class TextBuffer {
 public:
-    void clear() noexcept { bytes_.clear(); }
+    struct Part {
+        std::size_t begin;
+        std::size_t end;
+    };
+
+    void clear() noexcept {
+        bytes_.clear();
+        settled_.clear();
+    }
+
+    [[nodiscard]] std::size_t size() const noexcept { return bytes_.size(); }
 
     [[nodiscard]] bool empty() const noexcept { return bytes_.size() == 0; }
 
@@ -38,13 +50,33 @@ public:
         }
     }
 
+    /// Notes that the bytes from `begin` on are settled.
+    void settleFrom(std::size_t begin) {
+        if (begin == size()) {
+            return;
+        }
+        if (!settled_.empty() && settled_.back().end == begin) {
+            settled_.back().end = size();
+        } else {
+            settled_.push_back({begin, size()});
+        }
+    }
+
+    [[nodiscard]] const std::vector<Part>& settled() const noexcept { return settled_; }
+
+    [[nodiscard]] bool isSettled() const noexcept {
+        return empty()
+               || (!settled_.empty() && settled_.front().begin == 0
+                   && settled_.front().end == size());
+    }
+
     /// Returns the text. A zero byte follows it.
     [[nodiscard]] std::string_view view() noexcept {
         if (empty()) {
             return {"", 0};
         }
-        bytes_[bytes_.size()] = '\0';
-        return {bytes_.data(), bytes_.size()};
+        bytes_[size()] = '\0';
+        return {bytes_.data(), size()};
     }
 
 private:
@@ -63,6 +95,7 @@ private:
     }
 
     GrowingArray<char> bytes_;
+    std::vector<Part> settled_;  // in order
 };
 
 }  // namespace umpre

@@ -34,8 +34,10 @@ namespace {
 
 // The token road has quicker ways to nest deeply, and takes no memory for what is large.
 constexpr std::size_t kDeepest = 32;
-constexpr std::size_t kMostWork = std::size_t{1} << 20U;  // bytes
+constexpr std::size_t kMostWork = std::size_t{8} << 20U;  // bytes
 constexpr std::size_t kWorkOfReading = 16;
+
+const std::vector<TextBuffer::Part> kNoParts;
 
 [[nodiscard]] std::string_view viewOf(const char* begin, const char* end) noexcept {
     return {begin, static_cast<std::size_t>(end - begin)};
@@ -71,39 +73,65 @@ const char* TextExpander::expandCall(const MacroName& name, const char* open, co
     return replaceCall(name, open, end, Place::Replacement, result);
 }
 
-// Reads a text and adds what it comes out as. As everything here it returns false, or null, if that
-// is not told by bytes; nothing is cleaned up then.
-bool TextExpander::read(std::string_view text, Place place, Result& result) {
+// Reads a text, but for the parts that are settled, and adds what it comes out as. As everything
+// here it returns false, or null, if that is not told by bytes; nothing is cleaned up then.
+bool TextExpander::read(std::string_view text, const std::vector<TextBuffer::Part>& settled,
+                        Place place, Result& result) {
     ++depth_;
     work_ += text.size() + kWorkOfReading;
     if (depth_ > kDeepest || work_ > kMostWork) {
         return false;
     }
     const char* const end = text.data() + text.size();
-    const char* run = text.data();
-    const char* at = run;
-    while (at != nullptr && at < end) {
-        const TextByte kind = textByte(*at);
-        if (kind == TextByte::Plain) {
-            ++at;
-        } else if (kind != TextByte::Name) {
-            at = unusualTokenEnd(at, end);
-        } else {
-            const char* const behind = plainNameEnd(at);
-            const MacroName* const name = macroOf(viewOf(at, behind));
-            const char* next = behind;
-            if (name != nullptr && stays(*name, behind, end, place)) {
-                result.hasMacros = true;
-            } else if (name != nullptr) {
-                const bool isAdded = add(viewOf(run, at), result);
-                next = isAdded ? replace(*name, behind, end, place, result) : nullptr;
-                run = next;
-            }
-            at = next;
+    Reading reading{text.data(), end, text.data(), place};
+    for (const TextBuffer::Part& part : settled) {
+        if (!readUpTo(text.data() + part.begin, reading, result)) {
+            return false;
         }
+        reading.at = std::max(reading.at, text.data() + part.end);
+    }
+    if (!readUpTo(end, reading, result)) {
+        return false;
     }
     --depth_;
-    return at != nullptr && add(viewOf(run, end), result);
+    return add(viewOf(reading.run, end), result);
+}
+
+bool TextExpander::readUpTo(const char* end, Reading& reading, Result& result) {
+    while (reading.at < end) {
+        const TextByte kind = textByte(*reading.at);
+        if (kind == TextByte::Plain) {
+            ++reading.at;
+        } else if (kind == TextByte::Name) {
+            if (!readName(reading, result)) {
+                return false;
+            }
+        } else {
+            reading.at = unusualTokenEnd(reading.at, end);
+            if (reading.at == nullptr) {
+                return false;
+            }
+        }
+    }
+    return true;
+}
+
+bool TextExpander::readName(Reading& reading, Result& result) {
+    const char* const behind = plainNameEnd(reading.at);
+    const MacroName* const name = macroOf(viewOf(reading.at, behind));
+    if (name == nullptr) {
+        reading.at = behind;
+    } else if (stays(*name, behind, reading.end, reading.place)) {
+        result.hasMacros = true;
+        reading.at = behind;
+    } else {
+        if (!add(viewOf(reading.run, reading.at), result)) {
+            return false;
+        }
+        reading.at = replace(*name, behind, reading.end, reading.place, result);
+        reading.run = reading.at;
+    }
+    return reading.at != nullptr;
 }
 
 // Returns where replacements in a text at this place stand.
@@ -134,7 +162,7 @@ const char* TextExpander::replace(const MacroName& name, const char* behind, con
     }
     if (!name.macro.functionLike()) {
         around_.push_back(&name);
-        const bool isTold = read(name.macro.text(), within(place), result);
+        const bool isTold = read(name.macro.text(), kNoParts, within(place), result);
         around_.pop_back();
         return isTold ? behind : nullptr;
     }
@@ -159,13 +187,14 @@ const char* TextExpander::replaceCall(const MacroName& name, const char* open, c
     if (!substitute(body, argumentsBefore, replacement)) {
         return nullptr;
     }
+    TextBuffer& text = replacement.text;
     bool isTold = false;
-    if (hasMacros(body) || replacement.hasMacros) {
-        around_.push_back(&name);
-        isTold = read(replacement.text.view(), within(place), result);
-        around_.pop_back();
+    if (text.isSettled()) {
+        isTold = add(text.view(), result);
     } else {
-        isTold = add(replacement.text.view(), result);
+        around_.push_back(&name);
+        isTold = read(text.view(), text.settled(), within(place), result);
+        around_.pop_back();
     }
     arguments_.resize(argumentsBefore);
     buffersUsed_ = buffersBefore;
@@ -177,7 +206,8 @@ bool TextExpander::substitute(const MacroBody& body, std::size_t firstArgument, 
     for (const BodyStep& step : body.steps) {
         switch (step.kind) {
         case BodyStep::Kind::Tokens:
-            isTold = add(body.tokens->joined(step.first, step.last), result);
+            isTold =
+                addPart(body.tokens->joined(step.first, step.last), !hasMacros(body, step), result);
             break;
         case BodyStep::Kind::Argument:
             isTold = addArgument(firstArgument + step.first, result);
@@ -194,11 +224,12 @@ bool TextExpander::substitute(const MacroBody& body, std::size_t firstArgument, 
 
 bool TextExpander::addArgument(std::size_t index, Result& result) {
     if (!arguments_[index].mayHaveMacros && !watches_) {
-        return add(arguments_[index].raw, result);
+        work_ += arguments_[index].raw.size();
+        return work_ <= kMostWork && addPart(arguments_[index].raw, true, result);
     }
     if (!arguments_[index].isExpanded) {
         Result expansion{takeBuffer()};
-        if (!read(arguments_[index].raw, Place::Argument, expansion)) {
+        if (!read(arguments_[index].raw, kNoParts, Place::Argument, expansion)) {
             return false;
         }
         ArgumentText& argument = arguments_[index];
@@ -208,8 +239,7 @@ bool TextExpander::addArgument(std::size_t index, Result& result) {
     }
     const ArgumentText& argument = arguments_[index];
     work_ += argument.expansion.size();
-    result.hasMacros = result.hasMacros || argument.hasMacros;
-    return work_ <= kMostWork && add(argument.expansion, result);
+    return work_ <= kMostWork && addPart(argument.expansion, !argument.hasMacros, result);
 }
 
 bool TextExpander::addJoined(const MacroBody& body, const BodyStep& step, std::size_t firstArgument,
@@ -228,18 +258,20 @@ bool TextExpander::addJoined(const MacroBody& body, const BodyStep& step, std::s
         }
     }
     work_ += joined.view().size();
-    return work_ <= kMostWork && isPlain(joined.view(), result) && add(joined.view(), result);
+    bool hasMacros = false;
+    return work_ <= kMostWork && isPlain(joined.view(), hasMacros)
+           && addPart(joined.view(), !hasMacros, result);
 }
 
 // Tells whether a joined text yields tokens of text only, and notes whether there are names of
 // macros among them.
-bool TextExpander::isPlain(std::string_view text, Result& result) {
+bool TextExpander::isPlain(std::string_view text, bool& hasMacros) {
     const char* const end = text.data() + text.size();
     const char* at = text.data();
     while (at != nullptr && at < end) {
         if (isNameStart(*at)) {
             const char* const behind = plainNameEnd(at);
-            result.hasMacros = result.hasMacros || macroOf(viewOf(at, behind)) != nullptr;
+            hasMacros = hasMacros || macroOf(viewOf(at, behind)) != nullptr;
             at = behind;
         } else {
             at = unusualTokenEnd(at, end);
@@ -260,13 +292,27 @@ bool TextExpander::add(std::string_view text, Result& result) {
     return true;
 }
 
-bool TextExpander::hasMacros(const MacroBody& body) {
+// The same for a part of a replacement, which may be settled.
+bool TextExpander::addPart(std::string_view text, bool isSettled, Result& result) {
+    const std::size_t begin = result.text.size();
+    if (!add(text, result)) {
+        return false;
+    }
+    if (isSettled) {
+        result.text.settleFrom(begin);
+    }
+    return true;
+}
+
+// Tells whether the tokens of a step hold names of macros.
+bool TextExpander::hasMacros(const MacroBody& body, const BodyStep& step) {
     bool any = false;
-    for (const Name* const name : body.names) {
+    for (std::size_t index = step.firstName; index < step.lastName; ++index) {
+        const Name& name = *body.names[index];
         if (watches_) {
-            macros_.watch(name->text);
+            macros_.watch(name.text);
         }
-        any = any || name->isDefined;
+        any = any || name.isDefined;
     }
     return any;
 }

@@ -50,7 +50,19 @@ private:
     };
 
     void begin(bool watches) noexcept;
-    [[nodiscard]] bool read(std::string_view text, Place place, Result& result);
+
+    // A text that is read.
+    struct Reading {
+        const char* at;
+        const char* end;
+        const char* run;  // what is not added yet begins here
+        Place place;
+    };
+
+    [[nodiscard]] bool read(std::string_view text, const std::vector<TextBuffer::Part>& settled,
+                            Place place, Result& result);
+    [[nodiscard]] bool readUpTo(const char* end, Reading& reading, Result& result);
+    [[nodiscard]] bool readName(Reading& reading, Result& result);
     [[nodiscard]] bool stays(const MacroName& name, const char* behind, const char* end,
                              Place place) const;
     [[nodiscard]] const char* replace(const MacroName& name, const char* behind, const char* end,
@@ -62,9 +74,10 @@ private:
     [[nodiscard]] bool addArgument(std::size_t index, Result& result);
     [[nodiscard]] bool addJoined(const MacroBody& body, const BodyStep& step,
                                  std::size_t firstArgument, Result& result);
-    [[nodiscard]] bool isPlain(std::string_view text, Result& result);
+    [[nodiscard]] bool isPlain(std::string_view text, bool& hasMacros);
     [[nodiscard]] static bool add(std::string_view text, Result& result);
-    [[nodiscard]] bool hasMacros(const MacroBody& body);
+    [[nodiscard]] static bool addPart(std::string_view text, bool isSettled, Result& result);
+    [[nodiscard]] bool hasMacros(const MacroBody& body, const BodyStep& step);
     [[nodiscard]] const MacroName* macroOf(std::string_view name);
     [[nodiscard]] bool isAround(const MacroName& name) const;
     [[nodiscard]] TextBuffer& takeBuffer();
