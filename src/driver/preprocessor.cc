@@ -24,7 +24,7 @@ Preprocessor::Preprocessor(DiagnosticSink diagnostics, const RunOptions& options
       files_(sources_, output_, conditionals_, diagnostics_, options),
       inclusion_(sources_, expander_, lexer_, macros_, files_, diagnostics_),
       lineControl_(sources_, expander_, lexer_, output_, diagnostics_),
-      textReader_(output_, macros_.filter()),
+      textReader_(output_, macros_.filter(), *this),
       lineSkipper_(output_, conditionals_.groups()) {
     definePredefinedMacros(macros_);
 }
@@ -266,6 +266,11 @@ void Preprocessor::fileEnds() {
 
 void Preprocessor::fileResumed() {
     output_.writeLineMarker(sources_.position());
+}
+
+NameReader::Outcome Preprocessor::readName(std::string_view name, const char* end) {
+    files_.noteAction();
+    return expander_.readName(name, end);
 }
 
 }  // namespace umpre

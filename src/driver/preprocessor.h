@@ -15,6 +15,7 @@
 #include "driver/diagnostics.h"
 #include "lex/byte_sink.h"
 #include "lex/directive_line.h"
+#include "lex/name_reader.h"
 #include "lex/output_writer.h"
 #include "lex/run_options.h"
 #include "lex/scanner_stack.h"
@@ -35,7 +36,7 @@ enum class RunResult {
 };
 
 /// One run: reads the source from its first token to the end of the input and writes the result.
-class Preprocessor final : private FileEvents {
+class Preprocessor final : private FileEvents, private NameReader {
 public:
     /// Problems go to the sink, or nowhere if it is empty. The predefined macros take their date
     /// and time from now.
@@ -78,6 +79,7 @@ private:
     void fileEntered() override;
     void fileEnds() override;
     void fileResumed() override;
+    [[nodiscard]] Outcome readName(std::string_view name, const char* end) override;
 
     [[nodiscard]] RunResult readAll();
     [[nodiscard]] bool readBytes();

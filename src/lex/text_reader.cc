@@ -137,10 +137,20 @@ TextReader::Pass::Outcome TextReader::Pass::passName() {
         pass_.scan().resume(end, false);  // no macro, even if there is one of this name
         return std::nullopt;
     }
-    writeUpTo(at);
-    commit(end);
-    reader_.name_ = name;
-    return Stop::Name;
+    const NameReader::Outcome outcome = reader_.nameReader_.readName(name, pass_.end());
+    if (outcome.end == nullptr) {
+        writeUpTo(at);
+        commit(end);
+        reader_.name_ = name;
+        return Stop::Name;
+    }
+    if (outcome.text.data() != at) {
+        writeUpTo(at);
+        output_.write(outcome.text);
+        run_ = outcome.end;
+    }
+    pass_.scan().resume(outcome.end, false);
+    return std::nullopt;
 }
 
 TextReader::Pass::Outcome TextReader::Pass::passComment() {

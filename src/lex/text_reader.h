@@ -7,6 +7,7 @@
 
 #include "lex/cpp_file_scanner.h"
 #include "lex/name_filter.h"
+#include "lex/name_reader.h"
 #include "lex/output_writer.h"
 #include "lex/token.h"
 
@@ -23,8 +24,8 @@ public:
         Name,       ///< behind a name that may be a macro, which was not copied
     };
 
-    TextReader(OutputWriter& output, const NameFilter& macroNames) noexcept
-        : output_(output), macroNames_(macroNames) {}
+    TextReader(OutputWriter& output, const NameFilter& macroNames, NameReader& nameReader) noexcept
+        : output_(output), macroNames_(macroNames), nameReader_(nameReader) {}
 
     /// Copies text from the file to the output, from a line's start or from within a line, up to a
     /// name that may be a macro, a directive, or anything else out of the ordinary.
@@ -38,6 +39,7 @@ private:
 
     OutputWriter& output_;
     const NameFilter& macroNames_;
+    NameReader& nameReader_;
     std::string_view name_;
     std::string blanks_;  // of a line that begins with comments
 };

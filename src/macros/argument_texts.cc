@@ -77,7 +77,7 @@ private:
     [[nodiscard]] const char* passName(const char* at, ArgumentText& argument) const {
         const char* const behind = plainNameEnd(at);
         const std::string_view name(at, static_cast<std::size_t>(behind - at));
-        argument.mayHaveMacros = argument.mayHaveMacros || macroNames_.mayHold(name);
+        argument.mayHaveMacros = argument.mayHaveMacros || macroNames_.mayHoldAmongBytes(name);
         return behind;
     }
 

@@ -21,9 +21,10 @@ struct ArgumentText {
     bool hasMacros = false;      ///< names of macros were left in the expansion
 };
 
-/// Adds the arguments of a call as views of its bytes. Returns the end of the call whose "(" is at
-/// `open`, or null if that is not told by the bytes before `end`: the call goes on behind them or
-/// over a line end, its arguments are not `count`, or one of them does not stand as it should.
+/// Adds the arguments of a call as views of its bytes, behind which eight more can be read. Returns
+/// the end of the call whose "(" is at `open`, or null if that is not told by the bytes before
+/// `end`: the call goes on behind them or over a line end, its arguments are not `count`, or one of
+/// them does not stand as it should.
 [[nodiscard]] const char* takeArgumentTexts(const char* open, const char* end, std::size_t count,
                                             const NameFilter& macroNames,
                                             std::vector<ArgumentText>& arguments);

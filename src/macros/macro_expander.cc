@@ -16,6 +16,7 @@
 
 #include <utility>
 
+#include "lex/spelling.h"
 #include "macros/argument_slices.h"
 #include "macros/predefined_macros.h"
 
@@ -23,11 +24,34 @@ namespace umpre {
 
 using enum TokenKind;
 
+NameReader::Outcome MacroExpander::readName(std::string_view name, const char* end) {
+    const char* const behind = name.data() + name.size();
+    const MacroName* const macro = macros_.find(name);
+    if (macro == nullptr) {
+        return {name, behind};
+    }
+    if (macro->macro.functionLike()) {
+        return readCall(*macro, behind, end);
+    }
+    const std::optional<std::string_view> text = memo_.textOf(*macro);
+    return text ? NameReader::Outcome{*text, behind} : NameReader::Outcome{{}, nullptr};
+}
+
+NameReader::Outcome MacroExpander::readCall(const MacroName& name, const char* behind,
+                                            const char* end) {
+    while (behind < end && isBlankByte(*behind)) {
+        ++behind;
+    }
+    if (behind == end || *behind != '(') {
+        return {{}, nullptr};
+    }
+    call_.clear();
+    const char* const callEnd = texts_.expandCall(name, behind, end, call_);
+    return {call_.view(), callEnd};
+}
+
 std::string_view MacroExpander::expandName(const Token& token) {
     MacroName* const name = entryOf(token);
-    if (const std::optional<std::string_view> text = knownText(name)) {
-        return *text;
-    }
     switch (lookAt(name)) {
     case Outcome::Name: return token.text;
     case Outcome::Uncalled: written_.assign(skipped_).append(name->text); return written_;
@@ -60,31 +84,6 @@ std::string MacroExpander::expandLine(std::string_view text, LineKind kind) {
     sources_.endIsolation();
     lineKind_ = LineKind::Operand;
     return std::string(result.tokens().joined());
-}
-
-// Returns what a name in a file's text comes out as, if that is told by bytes.
-std::optional<std::string_view> MacroExpander::knownText(const MacroName* name) {
-    if (name == nullptr || sources_.plainRoad() || sources_.noExpandSet() != NoExpandSet()) {
-        return std::nullopt;
-    }
-    return name->macro.functionLike() ? callText(*name) : memo_.textOf(*name);
-}
-
-std::optional<std::string_view> MacroExpander::callText(const MacroName& name) {
-    CppFileScanner* const file = sources_.fileReadNow();
-    const std::string_view ahead = file == nullptr ? std::string_view() : file->bytesAhead();
-    const std::size_t open = ahead.find_first_not_of(" \t");
-    if (open == std::string_view::npos || ahead[open] != '(') {
-        return std::nullopt;
-    }
-    call_.clear();
-    const char* const end =
-        texts_.expandCall(name, ahead.data() + open, ahead.data() + ahead.size(), call_);
-    if (end == nullptr) {
-        return std::nullopt;
-    }
-    file->advance(static_cast<std::size_t>(end - ahead.data()), 0, false);
-    return call_.view();
 }
 
 MacroExpander::Outcome MacroExpander::lookAt(MacroName* name) {
@@ -243,7 +242,7 @@ bool MacroExpander::readList(Pieces& result) {
             return true;
         }
         if (isName(token.kind)) {
-            if (!readName(token, result)) {
+            if (!readListName(token, result)) {
                 return false;
             }
         } else if (token.kind == KW_DEFINED && lineKind_ == LineKind::Condition) {
@@ -266,7 +265,7 @@ void MacroExpander::takeList(Pieces& result) {
     }
 }
 
-bool MacroExpander::readName(const Token& token, Pieces& result) {
+bool MacroExpander::readListName(const Token& token, Pieces& result) {
     const NoExpandSet noExpand = sources_.noExpandSet();
     MacroName* const name = entryOf(token);
     switch (lookAt(name)) {

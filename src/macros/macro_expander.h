@@ -9,6 +9,7 @@
 #include <string_view>
 #include <vector>
 
+#include "lex/name_reader.h"
 #include "lex/no_expand_set.h"
 #include "lex/pieces.h"
 #include "lex/reporter.h"
@@ -46,6 +47,9 @@ public:
           collector_(sources, macros, reporter, lexer.texts()),
           substitution_(sources, macros, reporter, lexer, sets_) {}
 
+    /// Reads a name in a file's text, as bytes.
+    [[nodiscard]] NameReader::Outcome readName(std::string_view name, const char* end);
+
     /// Takes a name that was just read and returns what is to be written for it: the name itself,
     /// perhaps with blanks before it, a replacement that holds no macros, or nothing when a
     /// replacement was pushed. Valid until the next call and the next token read.
@@ -70,8 +74,8 @@ private:
     };
 
     [[nodiscard]] MacroName* entryOf(const Token& token);
-    [[nodiscard]] std::optional<std::string_view> knownText(const MacroName* name);
-    [[nodiscard]] std::optional<std::string_view> callText(const MacroName& name);
+    [[nodiscard]] NameReader::Outcome readCall(const MacroName& name, const char* behind,
+                                               const char* end);
     [[nodiscard]] Outcome lookAt(MacroName* name);
     void refresh(MacroName& name);
     [[nodiscard]] Outcome replaceObject(const MacroName& name);
@@ -85,7 +89,7 @@ private:
     void beginArgument(Invocation& invocation, Argument& argument);
     void endArgument(Invocation& invocation);
     [[nodiscard]] bool readList(Pieces& result);
-    [[nodiscard]] bool readName(const Token& token, Pieces& result);
+    [[nodiscard]] bool readListName(const Token& token, Pieces& result);
     void takeList(Pieces& result);
     void keepDefined(const Token& word, Pieces& result);
     [[nodiscard]] std::size_t effects() const;

@@ -160,8 +160,17 @@ MacroName& MacroTable::newName() {
     return names_.back().emplace_back();
 }
 
+// Readers of names look at eight bytes at a time, so that many can be read behind the last.
 char* MacroTable::newBytes(std::size_t size) {
-    return static_cast<char*>(bytes_.allocate(size, 1));
+    constexpr std::size_t kBlock = std::size_t{32} * 1024;
+    constexpr std::size_t kReadable = 8;
+    if (size + kReadable > left_) {
+        left_ = std::max(size + kReadable, kBlock);
+        free_ = static_cast<char*>(bytes_.allocate(left_, 1));
+    }
+    left_ -= size;
+    free_ += size;
+    return free_ - size;
 }
 
 void MacroTable::grow() {

@@ -93,6 +93,8 @@ private:
     void grow();
 
     std::pmr::monotonic_buffer_resource bytes_;  // of names and definitions
+    char* free_ = nullptr;                       // the rest of the last block
+    std::size_t left_ = 0;
     std::vector<std::vector<MacroName>> names_;  // each of them keeps its first room
     std::size_t nameCount_ = 0;
     std::vector<Slot> slots_;  // open addressing; at most three of four are taken

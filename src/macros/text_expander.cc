@@ -317,12 +317,13 @@ bool TextExpander::hasMacros(const MacroBody& body, const BodyStep& step) {
     return any;
 }
 
-// Returns the macro of this name, or null.
+// Returns the macro of this name, or null. From the bytes of all texts here eight can be read.
 const MacroName* TextExpander::macroOf(std::string_view name) {
     if (watches_) {
         macros_.watch(name);
     }
-    return macros_.filter().mayHold(name) && name != "defined" ? macros_.find(name) : nullptr;
+    return macros_.filter().mayHoldAmongBytes(name) && name != "defined" ? macros_.find(name)
+                                                                         : nullptr;
 }
 
 bool TextExpander::isAround(const MacroName& name) const {

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "lex/text_reader.h"
 
+#include <algorithm>
 #include <array>
 #include <cstddef>
 #include <string>
@@ -24,6 +25,20 @@ constexpr auto kWindowSizes = std::to_array<std::size_t>({1, 2, 3, 7, 64 * 1024}
 
 // A file that is read through windows, and an output in step with it. MACRO is the one name that
 // may be a macro's.
+// Tells what becomes of "KNOWN" and, up to its ")", of "CALL(...)", and of no other name.
+struct MacroOfOneText : NameReader {
+    [[nodiscard]] Outcome readName(std::string_view name, const char* end) override {
+        const char* const behind = name.data() + name.size();
+        const char* const close = std::find(behind, end, ')');
+        if (name == "CALL" && close != end) {
+            return {"<call>", close + 1};
+        }
+        return name == "KNOWN"   ? Outcome{"<known>", behind}
+               : name == "OTHER" ? Outcome{name, behind}
+                                 : Outcome{{}, nullptr};
+    }
+};
+
 struct Reading {
     Reading(std::string_view text, std::size_t windowSize) : file(comments, {false, windowSize}) {
         isOpen = file.open(directory.write("main", text));
@@ -32,6 +47,9 @@ struct Reading {
         output.countLines(1);
         names.add("MACRO");
         names.add("defined");
+        for (const char* const name : {"KNOWN", "CALL", "OTHER"}) {
+            names.add(name);
+        }
     }
 
     [[nodiscard]] const std::string& written() {
@@ -48,7 +66,8 @@ struct Reading {
     testing::RecordingSink sink;
     OutputWriter output;
     NameFilter names;
-    TextReader reader{output, names};
+    MacroOfOneText macros;
+    TextReader reader{output, names, macros};
 };
 
 // What is written of a text, and the name where that stopped, or the text of the token there.
@@ -136,6 +155,20 @@ TEST(TextReader, StopsAtANameThatMayBeAMacro) {
             {"\"\"MACRO\n", "\"\"", "MACRO"},
         },
         Stop::Name);
+}
+
+TEST(TextReader, WritesWhatNamesComeOutAs) {
+    expectCopies(
+        {
+            {"KNOWN\n", "<known>\n", ""},
+            {"a\n  KNOWN\n", "a\n  <known>\n", ""},
+            {"a KNOWN b KNOWN\n", "a <known> b <known>\n", ""},
+            {"a OTHER b\n", "a OTHER b\n", ""},
+            {"CALL(1)CALL(KNOWN) CALL(\")\n", "<call><call> <call>\n", ""},
+            {"CALL() /* x */ KNOWN\n\nKNOWN\n", "<call>   <known>\n\n<known>\n", ""},
+        },
+        Stop::LineStart);
+    expectCopies({{"KNOWN CALL(1\n", "<known> ", "CALL"}}, Stop::Name);
 }
 
 TEST(TextReader, StopsAtANameRightBehindANumber) {

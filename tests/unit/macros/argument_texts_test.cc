@@ -16,8 +16,9 @@ namespace {
     NameFilter names;
     names.add("N");
     std::vector<ArgumentText> arguments;
-    const char* const end = text.data() + text.size();
-    const char* const behind = takeArgumentTexts(text.data(), end, count, names, arguments);
+    const std::string padded = std::string(text) + "        ";
+    const char* const end = padded.data() + text.size();
+    const char* const behind = takeArgumentTexts(padded.data(), end, count, names, arguments);
     if (behind == nullptr) {
         return "(not told)";
     }

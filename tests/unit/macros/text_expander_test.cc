@@ -28,11 +28,11 @@ struct Fixture {
     // Expands what a text begins with: a name, or a name and its arguments. Puts "|" before the
     // rest.
     [[nodiscard]] std::string expanded(std::string_view text) {
-        std::string all(text);
-        const std::string name = all.substr(0, all.find('('));
-        const char* const end = all.data() + all.size();
+        const std::string all = std::string(text) + "        ";
+        const std::string name(text.substr(0, text.find('(')));
+        const char* const end = all.data() + text.size();
         TextBuffer result;
-        if (name == all) {
+        if (name == text) {
             return std::string(expander.expandObject(*macros.find(name), result) ? result.view()
                                                                                  : kNotTold);
         }
