@@ -26,6 +26,8 @@ constexpr std::size_t kMostFiles = 40;
 // Keeps what is written, up to a limit.
 class LimitedSink final : public ByteSink {
 public:
+    LimitedSink() { bytes_.reserve(kMostOutput); }
+
     [[nodiscard]] bool write(std::string_view bytes) override {
         isFull_ = isFull_ || bytes_.size() + bytes.size() > kMostOutput;
         if (!isFull_) {
@@ -80,7 +82,6 @@ struct Run {
 };
 
 [[nodiscard]] Outcome outcomeOf(const Files& files, const RunOptions& options, Source source) {
-    const MemoryLimit memory(kMostMemory);
     Run run(files, options);
     if (source == Source::Text) {
         run.preprocessor.openText("main", files.main);
@@ -91,9 +92,12 @@ struct Run {
             fail("the source cannot be opened");
         }
     }
-    run.outcome.result = run.preprocessor.run();
+    {
+        const MemoryLimit memory(kMostMemory);
+        run.outcome.result = run.preprocessor.run();
+        run.outcome.isCut = run.sink.isFull() || memory.wasMet();
+    }
     run.outcome.output = run.sink.bytes();
-    run.outcome.isCut = run.sink.isFull() || memory.wasMet();
     return run.outcome;
 }
 
