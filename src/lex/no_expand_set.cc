@@ -85,16 +85,34 @@ const NoExpandSet::Node* NoExpandSets::add(const Node* rest, const Name& name) {
     return &nodes_.back();
 }
 
+// Tells whether a set is another one with names added. As a rule it is: an argument was read in the
+// text that its call stands in.
+bool NoExpandSets::extends(const Node* set, const Node* other) noexcept {
+    while (set->size > other->size) {
+        set = set->rest;
+    }
+    return set == other;
+}
+
+NoExpandSet NoExpandSets::newUnion(NoExpandSet set, NoExpandSet other) {
+    if (extends(set.node_, other.node_)) {
+        return set;
+    }
+    if (extends(other.node_, set.node_)) {
+        return other;
+    }
+    for (const Node* node = other.node_; node != nullptr; node = node->rest) {
+        set = with(set, *node->name);
+    }
+    return set;
+}
+
 NoExpandSet NoExpandSets::unionOf(NoExpandSet set, NoExpandSet other) {
     const Key key{set.node_, other.node_};
     if (lastUnited_ != key) {
         const auto [entry, isNew] = unions_.try_emplace(key, set);
         if (isNew) {
-            NoExpandSet result = set;
-            for (const Node* node = other.node_; node != nullptr; node = node->rest) {
-                result = with(result, *node->name);
-            }
-            entry->second = result;
+            entry->second = newUnion(set, other);
         }
         lastUnited_ = key;
         lastUnion_ = entry->second;

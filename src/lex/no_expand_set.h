@@ -92,6 +92,8 @@ private:
 
     [[nodiscard]] bool holds(const Node& set, const Name& name);
     void mark(const Node& set);
+    [[nodiscard]] static bool extends(const Node* set, const Node* other) noexcept;
+    [[nodiscard]] NoExpandSet newUnion(NoExpandSet set, NoExpandSet other);
     [[nodiscard]] NoExpandSet unionOf(NoExpandSet set, NoExpandSet other);
     [[nodiscard]] NoExpandSet extend(NoExpandSet set, const Name& name);
     [[nodiscard]] const Node* add(const Node* rest, const Name& name);

@@ -72,6 +72,13 @@ TEST_F(NoExpandSetTest, AUnionWithItselfIsTheSetItself) {
     EXPECT_EQ(sets.united(set, set), set);
 }
 
+TEST_F(NoExpandSetTest, AUnionWithASetThatItWasMadeOfIsTheLargerOne) {
+    const NoExpandSet small = sets.with({}, a);
+    const NoExpandSet large = sets.with(sets.with(small, b), c);
+    EXPECT_EQ(sets.united(small, large), large);
+    EXPECT_EQ(sets.united(large, small), large);
+}
+
 TEST_F(NoExpandSetTest, AUnionMadeAgainIsTheSameSet) {
     const NoExpandSet one = sets.with({}, a);
     const NoExpandSet two = sets.with(sets.with({}, b), c);
