@@ -103,7 +103,7 @@ LineSkipper::Pass::Outcome LineSkipper::Pass::passSpecial() {
 }
 
 LineSkipper::Pass::Outcome LineSkipper::Pass::passLiteral() {
-    if (*at_ == '\'') {
+    if (*at_ == '\'' && !file_.literals().isOpen(at_)) {
         if (const char* const characterEnd = map_.characterEnd(at_, end_);
             characterEnd != nullptr) {
             at_ = characterEnd;

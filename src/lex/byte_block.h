@@ -107,6 +107,14 @@ public:
         return maskOf([](Part part) noexcept { return within<'0', 10>(part); });
     }
 
+    /// Returns where hexadecimal digits stand, in any case.
+    [[nodiscard]] Mask hexDigits() const noexcept {
+        return maskOf([](Part part) noexcept {
+            const Part lower = Vector::either(part, Vector::all(0x20));
+            return either(within<'a', 6>(lower), within<'0', 10>(part));
+        });
+    }
+
     /// Returns where blanks, control characters and bytes above 127 stand.
     [[nodiscard]] Mask blanksAndUnusual() const noexcept {
         return maskOf([](Part part) noexcept { return Vector::less(part, Vector::all(' ' + 1)); });

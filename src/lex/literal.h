@@ -30,7 +30,7 @@ public:
     /// literal is cut.
     [[nodiscard]] LiteralScan find(const char* quote, const char* end, bool isLast) noexcept {
         Range& open = *quote == '"' ? openStrings_ : openCharacters_;
-        if (quote >= open.begin && quote < open.end) {
+        if (isOpen(quote)) {
             return {LiteralScan::Result::Open, open.end};
         }
         LiteralScan scan = scanLiteral(quote, end);
@@ -41,6 +41,12 @@ public:
             open = {quote, scan.end};
         }
         return scan;
+    }
+
+    /// Tells whether the literal that this quote opens is known not to be closed.
+    [[nodiscard]] bool isOpen(const char* quote) const noexcept {
+        const Range& open = *quote == '"' ? openStrings_ : openCharacters_;
+        return quote >= open.begin && quote < open.end;
     }
 
     /// Must be called when the bytes move.

@@ -102,6 +102,14 @@ void TextMap::cover(const char* place, const char* end) {
     }
 }
 
+// Finds the masks of fewer bytes than a block has; what stands behind them is not looked at.
+void TextMap::findPart(const char* bytes, std::size_t size, BytesBefore& before,
+                       TextMasks& masks) const {
+    std::array<char, ByteBlock::kSize> part{};
+    std::memcpy(part.data(), bytes, size);
+    finder_(part.data(), 1, before, &masks);
+}
+
 // Finds the masks from begin_ on. Of what stands behind the end they tell nothing.
 void TextMap::findMasks(const char* end) {
     size_ = std::min(static_cast<std::size_t>(end - begin_), kBlocks * ByteBlock::kSize);
@@ -113,10 +121,13 @@ void TextMap::findMasks(const char* end) {
     TextMasks* behind = masks_.data() + whole;
     finder_(begin_, whole, before_, masks_.data());
     if (rest != 0) {
-        std::array<char, ByteBlock::kSize> last{};
-        std::memcpy(last.data(), begin_ + whole * ByteBlock::kSize, rest);
-        finder_(last.data(), 1, before_, behind++);
+        findPart(begin_ + whole * ByteBlock::kSize, rest, before_, *behind++);
     }
+    known_ = static_cast<std::size_t>(behind - masks_.data());
+    BytesBefore before = before_;
+    const char* const next = begin_ + size_;
+    findPart(next, std::min(static_cast<std::size_t>(end - next), ByteBlock::kSize), before,
+             behind_);
     constexpr Mask kAll = ~Mask{0};
     *behind = {kAll, kAll, kAll, 0, kAll, kAll, before_.lineFeeds};
 }

@@ -68,6 +68,32 @@ public:
     /// they do not tell.
     [[nodiscard]] Comment commentAt(const char* comment, const char* end);
 
+    /// The masks of 64 bytes that begin anywhere. What stands behind the end is not told.
+    struct Window {
+        Mask lineFeeds;
+        Mask lineEnds;
+        Mask special;
+        Mask strings;  ///< where strings are open, behind their first quotes and at these
+    };
+
+    /// Returns the masks of the bytes from `at` on, which stands before `end`. A string is open
+    /// there or not.
+    [[nodiscard]] Window windowAt(const char* at, const char* end, bool isOpen) {
+        const TextMasks* const first = &masksOf(at, end);
+        const TextMasks* const last = &masks_[known_ - 1];
+        const TextMasks* const second = first == last ? &behind_ : first + 1;
+        const auto place = static_cast<unsigned>(at - begin_) % ByteBlock::kSize;
+        const auto joined = [place](Mask low, Mask high) {
+            return low >> place | high << 1U << (ByteBlock::kSize - 1 - place);
+        };
+        const bool isOdd = (first->strings << 1U >> place & 1U) != 0;
+        const Mask strings = isOdd == isOpen ? first->strings : ~first->strings;
+        const Mask carried = 0 - (strings >> (ByteBlock::kSize - 1));
+        return {joined(first->lineFeeds, second->lineFeeds),
+                joined(first->lineEnds, second->lineEnds), joined(first->special, second->special),
+                joined(strings, second->strings ^ carried)};
+    }
+
     /// Returns a number that is larger by one behind each line feed between two places.
     [[nodiscard]] std::size_t lineFeedsBefore(const char* place, const char* end) {
         const TextMasks& masks = masksOf(place, end);
@@ -92,12 +118,15 @@ private:
 
     [[nodiscard]] const char* openQuote(const TextMasks* masks, const char* before) const noexcept;
     void cover(const char* place, const char* end);
+    void findPart(const char* bytes, std::size_t size, BytesBefore& before, TextMasks& masks) const;
     void findMasks(const char* end);
 
     TextMaskFinder finder_ = textMaskFinder();
     const char* begin_ = nullptr;  // of what is known
     std::size_t size_ = 0;
-    BytesBefore before_;  // what follows
+    BytesBefore before_;     // what follows
+    std::size_t known_ = 0;  // blocks
+    TextMasks behind_;       // of the block that follows, if there is one
     // Behind those of the bytes stand masks that end every search.
     std::vector<TextMasks> masks_;
 };

@@ -5,7 +5,7 @@
 
 namespace umpre {
 
-TextPass::TextPass(CppFileScanner& file, bool atLineStart, const NameFilter* names)
+TextPass::TextPass(CppFileScanner& file, bool atLineStart, const NameFilter& names)
     : TextPass(file, file.bytesAhead(), atLineStart, names) {}
 
 void TextPass::passContinuation(bool atLineStart) noexcept {

@@ -16,8 +16,8 @@ namespace umpre {
 /// told about it.
 class TextPass {
 public:
-    /// `names` as for a `TextScan`. If there are no bytes ahead, there is nothing to pass.
-    TextPass(CppFileScanner& file, bool atLineStart, const NameFilter* names);
+    /// `names` are those that may be macros. If there are no bytes ahead, there is nothing to pass.
+    TextPass(CppFileScanner& file, bool atLineStart, const NameFilter& names);
 
     [[nodiscard]] TextScan& scan() noexcept { return scan_; }
 
@@ -40,8 +40,10 @@ public:
     std::size_t commit(const char* place);
 
 private:
-    TextPass(CppFileScanner& file, std::string_view text, bool atLineStart, const NameFilter* names)
-        : file_(file), scan_(text, atLineStart, file.literals(), names), begin_(text.data()) {}
+    TextPass(CppFileScanner& file, std::string_view text, bool atLineStart, const NameFilter& names)
+        : file_(file),
+          scan_(text, atLineStart, file.textMap(), file.literals(), names),
+          begin_(text.data()) {}
 
     CppFileScanner& file_;
     TextScan scan_;

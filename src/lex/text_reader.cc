@@ -46,7 +46,7 @@ public:
         : reader_(reader),
           output_(reader.output_),
           file_(file),
-          pass_(file, from == Stop::LineStart, &reader.macroNames_),
+          pass_(file, from == Stop::LineStart, reader.macroNames_),
           run_(pass_.begin()) {}
 
     [[nodiscard]] Stop copy(Stop from);

@@ -2,17 +2,19 @@
 //
 // Looks at 64 bytes at a time, as masks. Of
 //
-//     x = f(2) + "N";\n
-//     1...1...........        where names begin
-//     ...........1....        what must be looked at itself: quotes, slashes, backslashes, "#"
-//     ...............1        line feeds
+//     x = f(2) + "N" // \n
+//     1...1...............    where names begin
+//     ...........11.......    strings, without their last quotes
+//     ...............1....    what must be looked at itself: comments, backslashes, "#" and so on
+//     ..................1.    line feeds
 //
-// the names are held against the filter, the literal is taken out (N is none of the names), and the
-// line feed is counted. A word that goes on behind the 64 bytes is left to the next 64, which begin
-// with it.
+// the names outside of strings are held against the filter. A word that goes on behind the 64 bytes
+// is left to the next 64, which begin with it. A string may go on; if its line turns out not to
+// close it, scanning goes back to its quote.
 #include "lex/text_scan.h"
 
 #include <algorithm>
+#include <bit>
 
 #include "lex/spelling.h"
 
@@ -20,17 +22,40 @@ namespace umpre {
 
 // What is known of up to 64 bytes.
 struct TextScan::Block {
+    Block(const char* begin, const char* end) noexcept
+        : at(begin), bytes(ByteBlock::between(begin, end)) {}
+
     const char* at;
-    unsigned size;
-    Mask letters;
-    Mask words;  // letters and digits
-    Mask lineFeeds;
-    Mask unusual;       // still to be looked at
-    Mask literals = 0;  // what stands in them
+    ByteBlock bytes;
+    unsigned size = 0;
+    Mask letters = 0;
+    Mask words = 0;  // letters and digits
+    Mask lineFeeds = 0;
+    Mask unusual = 0;   // still to be looked at
+    Mask strings = 0;   // without their last quotes
+    Mask literals = 0;  // what stands in literals
     // How far scanning comes in it, what stands there, and where to go on.
-    unsigned stop;
+    unsigned stop = 0;
     TextMark mark = TextMark::End;
-    const char* next;
+    const char* next = nullptr;
+    const char* openQuote = nullptr;  // of the string that goes on there
+
+    void end(const char* place, TextMark as, const char* goesOnAt) noexcept {
+        stop = static_cast<unsigned>(place - at);
+        mark = as;
+        next = goesOnAt;
+        openQuote = nullptr;
+        unusual = 0;
+    }
+
+    [[nodiscard]] bool isInString(unsigned place) const noexcept {
+        return (strings >> place & 1U) != 0;
+    }
+
+    // Returns how many bytes up to a place, and with it, one string holds.
+    [[nodiscard]] unsigned stringBytesUpTo(unsigned place) const noexcept {
+        return static_cast<unsigned>(std::countl_one(strings << (ByteBlock::kSize - 1 - place)));
+    }
 };
 
 namespace {
@@ -46,14 +71,18 @@ namespace {
 }  // namespace
 
 TextMark TextScan::next() {
-    return names_ != nullptr ? scan<true>() : scan<false>();
-}
-
-template <bool kCopies>
-TextMark TextScan::scan() {
-    while (at_ < end_) {
-        Block block = blockAt<kCopies>(at_);
-        if (kCopies && block.size == 0) {
+    for (;;) {
+        if (at_ >= end_) {
+            if (openQuote_ == nullptr) {
+                return TextMark::End;
+            }
+            if (!returnToQuote()) {
+                return TextMark::Literal;
+            }
+            continue;
+        }
+        Block block = blockAt(at_);
+        if (block.size == 0) {
             if (passLongWord()) {
                 return TextMark::Name;
             }
@@ -62,139 +91,204 @@ TextMark TextScan::scan() {
         if (block.unusual != 0) {
             passUnusual(block);
         }
-        if (kCopies) {
-            findNames(block);
-        }
+        findNames(block);
         lineFeeds_ += countBits(block.lineFeeds & bitsBelow(block.stop));
         at_ = block.next;
+        openQuote_ = block.openQuote;
         if (block.mark != TextMark::End) {
             return block.mark;
         }
     }
-    return TextMark::End;
 }
 
-template <bool kCopies>
-TextScan::Block TextScan::blockAt(const char* at) const noexcept {
-    const ByteBlock bytes = ByteBlock::between(at, end_);
-    Block block{};
-    block.at = at;
+TextScan::Block TextScan::blockAt(const char* at) {
+    const bool goesOn = openQuote_ != nullptr;
+    const TextMap::Window window = map_.windowAt(at, end_, goesOn);
+    Block block(at, end_);
     block.size = static_cast<unsigned>(
         std::min<std::size_t>(static_cast<std::size_t>(end_ - at), ByteBlock::kSize));
-    block.lineFeeds = bytes.any('\n');
-    block.unusual = bytes.any('"', '\'', '/', '\\', '\r', '#');
-    if (kCopies) {
-        // What stands before these 64 bytes is not known here.
-        const Mask blanks = bytes.blanksAndUnusual() & ~block.lineFeeds;
-        const Mask suspects = marksLineFeeds_ ? ~Mask{0} : blanks << 1U | 1U;
-        block.unusual |= block.lineFeeds & suspects;
-        block.letters = bytes.letters();
-        block.words = block.letters | bytes.digits();
-        block.size -= static_cast<unsigned>(std::countl_one(block.words));
-        const Mask inside = bitsBelow(block.size);
-        block.letters &= inside;
-        block.words &= inside;
-    }
+    const Mask all = bitsBelow(block.size);
+    block.literals = block.strings = window.strings & all;
+    block.lineFeeds = window.lineFeeds & all;
+    block.letters = block.bytes.letters();
+    block.words = block.letters | block.bytes.digits();
+    block.size -= static_cast<unsigned>(std::countl_one(block.words & ~block.strings));
+    const Mask inside = bitsBelow(block.size);
+    block.letters &= inside;
+    block.words &= inside;
+    // What stands before these 64 bytes is not known here.
+    const Mask blanks = block.bytes.blanksAndUnusual() & ~block.lineFeeds;
+    const Mask suspects = marksLineFeeds_ ? ~Mask{0} : blanks << 1U | 1U;
+    const Mask escapedQuote = !goesOn && *at == '"' && at[-1] == '\\' ? 1 : 0;
+    block.unusual = (((window.special | (block.lineFeeds & suspects)) & ~block.strings)
+                     | (window.lineEnds & block.strings) | escapedQuote)
+                    & inside;
     block.stop = block.size;
     block.next = at + block.size;
+    if (block.size != 0 && block.isInString(block.size - 1)) {
+        const unsigned size = block.stringBytesUpTo(block.size - 1);
+        block.openQuote = size == block.size && goesOn ? openQuote_ : block.next - size;
+    }
     return block;
 }
 
 // Looks at what is unusual in a block, up to the first that scanning must stop at.
 void TextScan::passUnusual(Block& block) {
     do {
-        const char* const place = block.at + firstBit(block.unusual);
+        const unsigned place = firstBit(block.unusual);
         block.unusual &= block.unusual - 1;
-        if (place >= block.next || !passAt(block, place)) {
-            return;
+        if (block.isInString(place)) {
+            passBrokenString(block, place);
+        } else {
+            passAt(block, block.at + place);
         }
     } while (block.unusual != 0);
 }
 
-// Returns false if scanning does not go on in this block.
-bool TextScan::passAt(Block& block, const char* place) {
-    const auto stop = [&block, place](TextMark mark) {
-        block.stop = static_cast<unsigned>(place - block.at);
-        block.mark = mark;
-        block.next = place;
-        return false;
-    };
+void TextScan::passAt(Block& block, const char* place) {
+    const auto stop = [&block, place](TextMark mark) { block.end(place, mark, place); };
     switch (*place) {
-    case '"':
-    case '\'': return passLiteral(block, place) || stop(TextMark::Literal);
-    case '/': return (place[1] != '/' && place[1] != '*') || stop(TextMark::Comment);
-    case '\\': return !isLineEndByte(place[1]) || stop(TextMark::Continuation);
-    case '\r': return stop(TextMark::CarriageReturn);
-    case '#': return place[1] == '#' || lineStart(place) == nullptr || stop(TextMark::Hash);
+    case '"': passLiteral(block, place); return;
+    case '\'': passCharacter(block, place); return;
+    case '/':
+        if (place[1] == '/' || place[1] == '*') {
+            stop(TextMark::Comment);
+        }
+        return;
+    case '\\':
+        if (isLineEndByte(place[1])) {
+            stop(TextMark::Continuation);
+        } else if (place[1] == '"') {
+            block.end(place + 1, TextMark::End, place + 1);
+        }
+        return;
+    case '\r': stop(TextMark::CarriageReturn); return;
+    case '#':
+        if (place[1] != '#' && lineStart(place) != nullptr) {
+            stop(TextMark::Hash);
+        }
+        return;
     default: break;
     }
     const char* const blanks = lineStart(place);
     if (blanks != nullptr && blanks != place) {
-        return stop(TextMark::BlankLine);
+        stop(TextMark::BlankLine);
+    } else if (marksLineFeeds_) {
+        stop(TextMark::LineFeed);
     }
-    return !marksLineFeeds_ || stop(TextMark::LineFeed);
 }
 
-// Returns false if the bytes at hand do not hold the literal whole.
-bool TextScan::passLiteral(Block& block, const char* quote) {
-    const LiteralScan literal = literals_.find(quote, end_, false);
-    if (literal.result == LiteralScan::Result::Closed) {
-        const auto first = static_cast<unsigned>(quote - block.at);
-        if (literal.end >= block.next) {
-            block.stop = first;
-            block.next = literal.end;
-            block.unusual = 0;
-        } else {
-            const Mask passed = bitsBelow(static_cast<std::size_t>(literal.end - block.at));
-            block.literals |= passed & ~bitsBelow(first);
-            block.unusual &= ~passed;
-        }
+// A string holds a line end: it is not closed, or holds a carriage return.
+void TextScan::passBrokenString(Block& block, unsigned lineEnd) {
+    const unsigned size = block.stringBytesUpTo(lineEnd);
+    if (size == lineEnd + 1 && openQuote_ != nullptr) {
+        block.end(block.at, TextMark::End, end_);
+        block.openQuote = openQuote_;  // as if it had gone on up to the end
+    } else {
+        passLiteral(block, block.at + (lineEnd + 1 - size));
     }
-    return literal.result != LiteralScan::Result::Cut;
+}
+
+// Ends the block before a literal and goes on behind it, or behind its quote if it is none. Stops
+// at it if the bytes at hand do not hold it whole.
+void TextScan::passLiteral(Block& block, const char* quote) {
+    const LiteralScan literal = literals_.find(quote, end_, false);
+    switch (literal.result) {
+    case LiteralScan::Result::Closed: block.end(quote, TextMark::End, literal.end); break;
+    case LiteralScan::Result::Open: block.end(quote, TextMark::End, quote + 1); break;
+    case LiteralScan::Result::Cut: block.end(quote, TextMark::Literal, quote); break;
+    }
+}
+
+// Double quotes in a character literal belong to no string, which the masks do not know: if their
+// number is odd, the block ends.
+void TextScan::passCharacter(Block& block, const char* quote) {
+    const char* const end = literals_.isOpen(quote) ? nullptr : map_.characterEnd(quote, end_);
+    if (end == nullptr) {
+        passLiteral(block, quote);
+        return;
+    }
+    const auto size = static_cast<unsigned>(end - block.at);
+    if (end > block.next || block.isInString(size - 1)) {
+        block.end(quote, TextMark::End, end);
+        return;
+    }
+    const Mask passed = bitsBelow(size);
+    block.literals |= passed & ~bitsBelow(static_cast<std::size_t>(quote - block.at));
+    block.unusual &= ~passed;
+}
+
+// Goes back to the quote of the string that goes on here, and on behind it as `passLiteral` does.
+bool TextScan::returnToQuote() {
+    const LiteralScan literal = literals_.find(openQuote_, end_, false);
+    at_ = std::exchange(openQuote_, nullptr);
+    if (literal.result == LiteralScan::Result::Cut) {
+        return false;
+    }
+    at_ = literal.result == LiteralScan::Result::Closed ? literal.end : at_ + 1;
+    return true;
 }
 
 void TextScan::findNames(Block& block) {
     const Mask names = namesIn(block);
     if (names != 0) {
-        block.stop = firstBit(names);
-        block.mark = TextMark::Name;
-        block.next = block.at + block.stop;
-        nameEnd_ = block.next + std::countr_one(block.words >> block.stop);
+        const char* const name = block.at + firstBit(names);
+        block.end(name, TextMark::Name, name);
+        nameEnd_ = name + std::countr_one(block.words >> block.stop);
     }
 }
 
 // Returns where names begin that may be macros. Of several only the first counts.
 ByteBlock::Mask TextScan::namesIn(const Block& block) const noexcept {
     const Mask text = bitsBelow(block.stop) & ~block.literals;
-    const Mask wordStarts = block.words & ~(block.words << 1U);
-    Mask starts = wordStarts & block.letters & text;
-    // The sum carries each start to the end of its word.
-    Mask ends = (block.words + starts) & ~block.words;
+    const Mask wordStarts = block.words & ~(block.words << 1U) & text;
+    const Mask numbers = wordStarts & ~block.letters;
+    const Mask digits = block.words & ~block.letters;
+    // The sum carries the beginning of each number behind its leading digits.
+    const Mask tails = (digits + numbers) & ~digits & block.letters;
+    Mask starts = wordStarts & block.letters;
     Mask found = 0;
+    if (tails != 0) {
+        starts |= namesBehindNumbers(block, numbers, tails, found);
+    }
+    Mask ends = (block.words + starts) & ~block.words;
     while (starts != 0) {
         const unsigned start = firstBit(starts);
         const std::string_view name(block.at + start, firstBit(ends) - start);
-        found |= static_cast<Mask>(names_->mayHoldAmongBytes(name)) << start;
+        found |= static_cast<Mask>(names_.mayHoldAmongBytes(name)) << start;
         starts &= starts - 1;
         ends &= ends - 1;
     }
-    // Letters behind the leading digits of a word: it may go on as a name.
-    const Mask digits = block.words & ~block.letters;
-    const Mask numbers = wordStarts & digits & text;
-    Mask tails = (digits + numbers) & ~digits & block.letters;
-    while (tails != 0) {
-        const unsigned tail = firstBit(tails);
-        tails &= tails - 1;
-        const unsigned start =
-            63U - static_cast<unsigned>(std::countl_zero(numbers & bitsBelow(tail)));
-        const char* const wordEnd = block.at + tail + std::countr_one(block.words >> tail);
-        const char* const name = behindNumbers(block.at + start, wordEnd);
+    return found;
+}
+
+// Of words that begin with digits and go on with letters, at `tails`, returns where names begin. A
+// word with digits behind a suffix holds several numbers; what is behind these is added to `found`
+// if it may be a macro.
+ByteBlock::Mask TextScan::namesBehindNumbers(const Block& block, Mask numbers, Mask tails,
+                                             Mask& found) const noexcept {
+    const Mask xs = block.bytes.any('x', 'X');
+    const Mask us = block.bytes.any('u', 'U');
+    const Mask ls = block.bytes.any('l', 'L');
+    const Mask hexDigits = block.bytes.hexDigits() & block.words;
+    const Mask firstHexDigits = (((numbers & block.bytes.any('0')) << 1U & xs) << 1U) & hexDigits;
+    const Mask behindHexDigits = (hexDigits + firstHexDigits) & ~hexDigits;
+    const Mask behindDigits = (tails & ~(firstHexDigits >> 1U)) | behindHexDigits;
+    const Mask firstSuffixes = behindDigits & (us | ls);
+    const Mask secondSuffixes =
+        ((firstSuffixes & us) << 1U & ls) | ((firstSuffixes & ls) << 1U & us);
+    const Mask behind = (behindDigits & ~firstSuffixes) | ((firstSuffixes << 1U) & ~secondSuffixes)
+                        | secondSuffixes << 1U;
+    for (Mask others = behind & block.words & ~block.letters; others != 0; others &= others - 1) {
+        const unsigned place = firstBit(others);
+        const char* const wordEnd = block.at + place + std::countr_one(block.words >> place);
+        const char* const name = behindNumbers(block.at + place, wordEnd);
         if (name < wordEnd
-            && names_->mayHoldAmongBytes({name, static_cast<std::size_t>(wordEnd - name)})) {
+            && names_.mayHoldAmongBytes({name, static_cast<std::size_t>(wordEnd - name)})) {
             found |= Mask{1} << static_cast<unsigned>(name - block.at);
         }
     }
-    return found;
+    return behind & block.letters;
 }
 
 // Passes over a word of more than 64 bytes. Returns true if it is a name that may be a macro, or
@@ -210,19 +304,10 @@ bool TextScan::passLongWord() noexcept {
     const char* const name = behindNumbers(at_, wordEnd);
     const bool found =
         name < wordEnd
-        && names_->mayHoldAmongBytes({name, static_cast<std::size_t>(wordEnd - name)});
+        && names_.mayHoldAmongBytes({name, static_cast<std::size_t>(wordEnd - name)});
     at_ = found ? name : wordEnd;
     nameEnd_ = wordEnd;
     return found;
-}
-
-const char* TextScan::lineStart(const char* place) const noexcept {
-    const char* at = place;
-    while (at != floor_ && isBlankByte(at[-1])) {
-        --at;
-    }
-    const bool isStart = at == floor_ ? startsLine_ : at[-1] == '\n';
-    return isStart ? at : nullptr;
 }
 
 }  // namespace umpre

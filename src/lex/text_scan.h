@@ -7,8 +7,10 @@
 #include <utility>
 
 #include "lex/byte_block.h"
+#include "lex/line_start.h"
 #include "lex/literal.h"
 #include "lex/name_filter.h"
+#include "lex/text_map.h"
 
 namespace umpre {
 
@@ -30,14 +32,14 @@ enum class TextMark {
 class TextScan {
 public:
     /// Begins at the beginning of `text`, where a token begins, the first of its line if
-    /// `atLineStart`. Eight bytes behind the text can be read. `names` are those that may be
-    /// macros; if there are none, the text is not to be copied, and blank lines do not matter.
-    TextScan(std::string_view text, bool atLineStart, LiteralFinder& literals,
-             const NameFilter* names) noexcept
+    /// `atLineStart`. Eight bytes before the text and 64 behind it can be read. The map is of this
+    /// text. `names` are those that may be macros.
+    TextScan(std::string_view text, bool atLineStart, TextMap& map, LiteralFinder& literals,
+             const NameFilter& names) noexcept
         : end_(text.data() + text.size()),
           at_(text.data()),
-          floor_(at_),
-          startsLine_(atLineStart),
+          lineStart_(at_, atLineStart),
+          map_(map),
           literals_(literals),
           names_(names) {}
 
@@ -60,37 +62,42 @@ public:
 
     /// Returns where the blanks before `place` begin if nothing else stands before it on its line,
     /// otherwise null.
-    [[nodiscard]] const char* lineStart(const char* place) const noexcept;
+    [[nodiscard]] const char* lineStart(const char* place) const noexcept {
+        return lineStart_.before(place);
+    }
 
     /// Goes on at `place`, where a token begins, the first of its line if `atLineStart`.
     void resume(const char* place, bool atLineStart) noexcept {
-        at_ = floor_ = place;
-        startsLine_ = atLineStart;
+        at_ = place;
+        lineStart_ = {place, atLineStart};
     }
 
 private:
     using Mask = ByteBlock::Mask;
     struct Block;
 
-    template <bool kCopies>
-    [[nodiscard]] TextMark scan();
-    template <bool kCopies>
-    [[nodiscard]] Block blockAt(const char* at) const noexcept;
+    [[nodiscard]] Block blockAt(const char* at);
     void passUnusual(Block& block);
-    [[nodiscard]] bool passAt(Block& block, const char* place);
-    [[nodiscard]] bool passLiteral(Block& block, const char* quote);
+    void passAt(Block& block, const char* place);
+    void passCharacter(Block& block, const char* quote);
+    void passLiteral(Block& block, const char* quote);
+    void passBrokenString(Block& block, unsigned lineEnd);
+    [[nodiscard]] bool returnToQuote();
     void findNames(Block& block);
     [[nodiscard]] Mask namesIn(const Block& block) const noexcept;
+    [[nodiscard]] Mask namesBehindNumbers(const Block& block, Mask numbers, Mask tails,
+                                          Mask& found) const noexcept;
     [[nodiscard]] bool passLongWord() noexcept;
 
     const char* end_;
     const char* at_;
     const char* nameEnd_ = nullptr;
-    const char* floor_;  // where this stretch of scanning began
-    bool startsLine_;    // a line begins at floor_
+    const char* openQuote_ = nullptr;  // of the string that goes on at at_
+    LineStart lineStart_;
     bool marksLineFeeds_ = false;
+    TextMap& map_;
     LiteralFinder& literals_;
-    const NameFilter* names_;
+    const NameFilter& names_;
     std::size_t lineFeeds_ = 0;
 };
 
