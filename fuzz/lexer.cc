@@ -21,8 +21,9 @@ namespace {
 // their own text. A zero byte ends the tokens.
 class Record final : public CommentSink {
 public:
-    void commentLineEnds(std::size_t count) override {
-        text_.append(std::to_string(count)).append(" line ends, ");
+    bool commentLineEnds(std::size_t count) override {
+        text_.append(count, '\n');
+        return true;
     }
 
     void unterminatedComment(std::int32_t line) override {
@@ -49,8 +50,8 @@ private:
     std::int32_t line = 1;
     for (const RuledToken& token : allTokens(text)) {
         line += static_cast<std::int32_t>(token.lineEnds);
-        if (token.isComment && token.lineEnds > 0) {
-            record.commentLineEnds(token.lineEnds);
+        if (token.isComment) {
+            (void)record.commentLineEnds(token.lineEnds);
         }
         if (token.isUnterminated) {
             record.unterminatedComment(line);

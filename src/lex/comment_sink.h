@@ -12,7 +12,9 @@ namespace umpre {
 class CommentSink {
 public:
     virtual ~CommentSink() = default;
-    virtual void commentLineEnds(std::size_t count) = 0;
+    /// Line ends were read; those of a long comment come in parts. Returns false if it is of no use
+    /// to read on.
+    virtual bool commentLineEnds(std::size_t count) = 0;
     virtual void unterminatedComment(std::int32_t line) = 0;
 };
 

@@ -7,6 +7,7 @@
 
 #include <array>
 #include <cassert>
+#include <utility>
 
 #include "lex/comment.h"
 #include "lex/literal.h"
@@ -175,6 +176,12 @@ TokenKind CppLexer::blockComment() {
     *yy_c_buf_p = yy_hold_char;
     char* at = yy_c_buf_p;
     std::size_t lineEnds = 0;
+    bool isWanted = true;
+    // A comment may have no end, as its input may; its line ends do not wait for it.
+    const auto goesOn = [&] {
+        isWanted = passOnLineEnds(lineEnds);
+        return isWanted && readOn(at, Need::Bytes);
+    };
     CommentScan scan{};
     do {
         scan = scanBlockComment(at, end_);
@@ -187,18 +194,22 @@ TokenKind CppLexer::blockComment() {
             }
             at += at[1] == '\n' ? 2 : 1;
         }
-    } while (scan.stop == Stop::CarriageReturn
-             || (scan.stop == Stop::Cut && readOn(at, Need::Bytes)));
+    } while (scan.stop == Stop::CarriageReturn || (scan.stop == Stop::Cut && goesOn()));
     moveTo(scan.stop == Stop::Closed ? at : end_);
     yytext = blank.data();
-    line_ = addLines(line_, lineEnds);
-    if (lineEnds > 0) {
-        commentSink_.commentLineEnds(lineEnds);
-    }
-    if (scan.stop != Stop::Closed) {
+    isWanted = passOnLineEnds(lineEnds) && isWanted;
+    if (scan.stop != Stop::Closed && isWanted) {
         commentSink_.unterminatedComment(line_);
     }
     return TokenKind::WHITESPACE;
+}
+
+// Counts the line ends that were read in a comment, and begins a new count. Returns false if nobody
+// wants more of it.
+bool CppLexer::passOnLineEnds(std::size_t& count) {
+    const std::size_t passed = std::exchange(count, 0);
+    line_ = addLines(line_, passed);
+    return passed == 0 || commentSink_.commentLineEnds(passed);
 }
 
 TokenKind CppLexer::lineComment() {

@@ -109,7 +109,7 @@ void LexedText::carryOutEffects(std::size_t index, CommentSink& sink) const {
     for (auto it = std::lower_bound(effects_.begin(), effects_.end(), index, before);
          it != effects_.end() && it->token == index; ++it) {
         if (it->lineEnds > 0) {
-            sink.commentLineEnds(it->lineEnds);
+            (void)sink.commentLineEnds(it->lineEnds);
         }
         if (it->unterminated) {
             sink.unterminatedComment(it->line);

@@ -203,9 +203,10 @@ void ScannerStack::endIsolation() {
     dropCurrent();
 }
 
-void ScannerStack::commentLineEnds(std::size_t count) {
+bool ScannerStack::commentLineEnds(std::size_t count) {
     ++commentEffects_;
     output_.writeLineFeeds(count);
+    return !output_.failed();
 }
 
 void ScannerStack::unterminatedComment(std::int32_t line) {

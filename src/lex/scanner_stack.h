@@ -142,7 +142,7 @@ public:
     [[nodiscard]] std::size_t commentEffects() const noexcept { return commentEffects_; }
 
 private:
-    void commentLineEnds(std::size_t count) override;
+    bool commentLineEnds(std::size_t count) override;
     void unterminatedComment(std::int32_t line) override;
 
     [[nodiscard]] CommentSink& commentSink() noexcept { return *this; }

@@ -13,8 +13,9 @@ void TextLexer::append(LexedText& to, std::string_view text) {
     }
 }
 
-void TextLexer::commentLineEnds(std::size_t count) {
+bool TextLexer::commentLineEnds(std::size_t count) {
     to_->addCommentEffect(count, false, 0);
+    return true;
 }
 
 void TextLexer::unterminatedComment(std::int32_t line) {

@@ -32,7 +32,7 @@ public:
     [[nodiscard]] TextPool& texts() noexcept { return texts_; }
 
 private:
-    void commentLineEnds(std::size_t count) override;
+    bool commentLineEnds(std::size_t count) override;
     void unterminatedComment(std::int32_t line) override;
 
     TextPool texts_;

@@ -14,7 +14,10 @@ namespace umpre::testing {
 /// not closed by line N.
 class RecordingCommentSink final : public CommentSink {
 public:
-    void commentLineEnds(std::size_t count) override { effects_.append(count, '\n'); }
+    bool commentLineEnds(std::size_t count) override {
+        effects_.append(count, '\n');
+        return true;
+    }
 
     void unterminatedComment(std::int32_t line) override {
         effects_.append("[").append(std::to_string(line)).append("]");
