@@ -80,12 +80,9 @@ std::uint32_t KnownLines::hashOf(std::string_view line) noexcept {
 // Returns the slot of this line, or the free one for it.
 std::size_t KnownLines::slotOf(std::string_view line, std::uint32_t hash) const noexcept {
     const std::size_t mask = slots_.size() - 1;
-    const ByteBlock block(line.data());
     const auto isFound = [&](const Slot& slot) {
         return slot.number == 0
-               || (slot.hash == hash
-                   && (~lines_[slot.number - 1].text.block().same(block) & bitsBelow(line.size()))
-                          == 0);
+               || (slot.hash == hash && lines_[slot.number - 1].text.standsAt(line.data()));
     };
     std::size_t slot = hash & mask;
     while (!isFound(slots_[slot])) {

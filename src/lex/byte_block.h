@@ -72,27 +72,10 @@ public:
         return BasicByteBlock(bytes.data());
     }
 
-    /// Writes the bytes to `at`.
-    void copyTo(char* at) const noexcept {
-        for (std::size_t part = 0; part < kParts; ++part) {
-            Vector::store(at + part * Vector::kSize, parts_[part]);
-        }
-    }
-
     /// Returns where any of some bytes stand.
     template <typename... Bytes>
     [[nodiscard]] Mask any(Bytes... bytes) const noexcept {
         return maskOf([bytes...](Part part) noexcept { return either(equal(part, bytes)...); });
-    }
-
-    /// Returns where both blocks have the same bytes.
-    [[nodiscard]] Mask same(const BasicByteBlock& other) const noexcept {
-        Mask mask = 0;
-        for (std::size_t part = 0; part < kParts; ++part) {
-            const Part isSame = Vector::equal(parts_[part], other.parts_[part]);
-            mask |= Mask{Vector::bits(isSame)} << part * Vector::kSize;
-        }
-        return mask;
     }
 
     /// Returns where ASCII letters and underscores stand.

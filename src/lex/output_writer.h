@@ -40,7 +40,7 @@ public:
             write(snippet.text());
             return;
         }
-        snippet.block().copyTo(block_.data() + used_);
+        snippet.copyTo(block_.data() + used_);
         used_ += snippet.size();
     }
 

@@ -51,25 +51,6 @@ TEST(ByteBlock, FindsAnyOfSomeBytes) {
     EXPECT_EQ(block.any('x', '\0'), 0U);
 }
 
-TEST(ByteBlock, TellsWhereTwoAreTheSame) {
-    const std::string text(64, 'a');
-    for (std::size_t place = 0; place < 64; ++place) {
-        std::string other = text;
-        other[place] = 'b';
-        EXPECT_EQ(ByteBlock(text.data()).same(ByteBlock(other.data())), ~(Mask{1} << place));
-    }
-}
-
-TEST(ByteBlock, IsCopied) {
-    std::string text;
-    for (char byte = 0; byte < 64; ++byte) {
-        text.push_back(byte);
-    }
-    std::string copy(66, 'x');
-    ByteBlock(text.data()).copyTo(copy.data() + 1);
-    EXPECT_EQ(copy, "x" + text + "x");
-}
-
 TEST(ByteBlock, TakesNoBytesBehindTheEnd) {
     const std::string text(80, 'a');
     for (std::size_t size = 0; size <= 70; ++size) {

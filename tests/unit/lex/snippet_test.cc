@@ -15,8 +15,31 @@ TEST(Snippet, HoldsUpTo64Bytes) {
         EXPECT_EQ(snippet.text(), text);
         EXPECT_EQ(snippet.size(), size);
         EXPECT_FALSE(snippet.isEmpty());
-        EXPECT_EQ(snippet.block().any('a'), bitsBelow(size));
-        EXPECT_EQ(snippet.block().any('\0'), ~bitsBelow(size));
+    }
+}
+
+TEST(Snippet, IsCopiedAsAWhole) {
+    for (std::size_t size = 0; size <= 64; ++size) {
+        std::string text;
+        for (std::size_t at = 0; at < size; ++at) {
+            text.push_back(static_cast<char>('0' + at));
+        }
+        std::string copy(66, 'x');
+        Snippet(text).copyTo(copy.data() + 1);
+        EXPECT_EQ(copy, "x" + text + std::string(64 - size, '\0') + "x");
+    }
+}
+
+TEST(Snippet, KnowsWhereItStands) {
+    const std::string text(64, 'a');
+    for (std::size_t size = 1; size <= 64; ++size) {
+        const Snippet snippet(text.substr(0, size));
+        EXPECT_TRUE(snippet.standsAt(text.data()));
+        for (std::size_t place = 0; place < 64; ++place) {
+            std::string other = text;
+            other[place] = 'b';
+            EXPECT_EQ(snippet.standsAt(other.data()), place >= size);
+        }
     }
 }
 
