@@ -43,21 +43,53 @@ void FileFinder::lookAtClock() {
 bool FileFinder::enter(std::string_view name, IncludeForm form) {
     entered_ = nullptr;
     searchTime_ = timeBy(CLOCK_REALTIME_COARSE);
+    if (searchMoment_ != moment()) {
+        searchMoment_ = moment();
+        momentTime_ = searchTime_;
+    }
+    // Who serves files or is told of them wants to know of each attempt.
+    if (options_.plainRoad || resolver_ || observer_) {
+        return enter(name, form, nullptr);
+    }
+    // That there is no such file must not be said of what was so a moment ago.
+    std::size_t omitted = 0;
+    return enter(name, form, &omitted) || (omitted > 0 && enter(name, form, nullptr));
+}
+
+// Attempts that are known to fail are omitted and counted, unless `omitted` is null.
+bool FileFinder::enter(std::string_view name, IncludeForm form, std::size_t* omitted) {
     for (std::size_t number = 0;; ++number) {
         const std::string* const path = candidate(name, form, number);
         if (path == nullptr) {
             return false;
         }
-        if (enterPath(*path)) {
-            entered_ = remember(*path, sources_.currentFile().identity());
-            if (entered_ != nullptr) {
-                ByName<Search>& searches = searches_[static_cast<std::size_t>(form)];
-                auto& [key, search] = *searches.try_emplace(std::string(name)).first;
-                search = {key, form, entered_, number, moment()};
-            }
+        if (omitted != nullptr && names_.lacks(*path, searchMoment_)) {
+            ++*omitted;
+        } else if (enterPath(*path)) {
+            noteEntered(*path, name, form, number);
             return true;
+        } else if (omitted != nullptr) {
+            names_.noteMiss(*path, searchMoment_, searchTime_);
         }
     }
+}
+
+void FileFinder::noteEntered(const std::string& path, std::string_view name, IncludeForm form,
+                             std::size_t attempts) {
+    const FileIdentity& identity = sources_.currentFile().identity();
+    noteChange(identity);
+    entered_ = remember(path, identity);
+    if (entered_ != nullptr) {
+        ByName<Search>& searches = searches_[static_cast<std::size_t>(form)];
+        auto& [key, search] = *searches.try_emplace(std::string(name)).first;
+        search = {key, form, entered_, attempts, moment()};
+    }
+}
+
+// What was looked at in this moment may be older than a file that was changed since.
+void FileFinder::noteChange(const FileIdentity& identity) {
+    const std::int64_t lastChange = std::max(identity.modified, identity.changed);
+    changes_ += momentTime_ - lastChange < options_.settlingTime ? 1U : 0U;
 }
 
 bool FileFinder::enterPath(const std::string& path) {
@@ -132,7 +164,6 @@ bool FileFinder::isLasting(const FileIdentity& identity) const {
 // Most files are included once, so the first time only leaves a mark.
 std::shared_ptr<KnownFile> FileFinder::remember(const std::string& path,
                                                 const FileIdentity& identity) {
-    // Who serves files or is told of them wants to know of each attempt.
     if (options_.plainRoad || resolver_ || observer_ || !isLasting(identity)) {
         return nullptr;
     }

@@ -13,6 +13,7 @@
 #include <utility>
 #include <vector>
 
+#include "directives/directory_names.h"
 #include "directives/include_form.h"
 #include "lex/file_bytes.h"
 #include "lex/file_identity.h"
@@ -56,7 +57,11 @@ class FileFinder {
 public:
     FileFinder(ScannerStack& sources, const OutputWriter& output, const Reporter& reporter,
                const RunOptions& options)
-        : sources_(sources), output_(output), reporter_(reporter), options_(options) {}
+        : sources_(sources),
+          output_(output),
+          reporter_(reporter),
+          options_(options),
+          names_(options.settlingTime) {}
 
     /// Adds a directory to search, after those added before.
     void addDirectory(std::string_view directory) { directories_.emplace_back(directory); }
@@ -103,7 +108,11 @@ private:
     template <typename Value>
     using ByName = std::unordered_map<std::string, Value, Hash, std::equal_to<>>;
 
+    [[nodiscard]] bool enter(std::string_view name, IncludeForm form, std::size_t* omitted);
     [[nodiscard]] bool enterPath(const std::string& path);
+    void noteEntered(const std::string& path, std::string_view name, IncludeForm form,
+                     std::size_t attempts);
+    void noteChange(const FileIdentity& identity);
     [[nodiscard]] bool open(const std::string& path);
     [[nodiscard]] bool isStill(Search& search);
     [[nodiscard]] bool leadsToSameFile(const Search& search);
@@ -127,6 +136,9 @@ private:
     std::size_t clock_ = 0;
     std::size_t changes_ = 0;  // of files, that were met
     std::int64_t searchTime_ = 0;
+    std::size_t searchMoment_ = 0;
+    std::int64_t momentTime_ = 0;  // when it began
+    DirectoryNames names_;
     std::shared_ptr<KnownFile> entered_;
 };
 

@@ -14,6 +14,7 @@ namespace umpre {
 namespace {
 
 using enum IncludeForm;
+using enum TokenKind;
 
 // A sink that nobody can wait at, as if it wrote to the file of this identity.
 class FileSink final : public ByteSink {
@@ -201,6 +202,51 @@ TEST(FileFinder, BeginsNoMomentWhenTheOutputGoesToAFile) {
     i.f.output.write("text");
     i.f.output.flush();
     EXPECT_EQ(i.known("a.h", Brackets), i.directory.nameOf("two/a.h"));
+}
+
+// Looks for files that "two" alone holds until "one" need not be looked into any more.
+struct MissingFixture : FinderFixture {
+    explicit MissingFixture(
+        const RunOptions& runOptions = {.settlingTime = RunOptions::kAlwaysSettled})
+        : FinderFixture(runOptions) {
+        directory.write("two/b.h", "in two\n");
+        for (int time = 0; time < 1000; ++time) {
+            EXPECT_TRUE(finder.enter("a.h", Brackets));
+            EXPECT_TRUE(f.sources.leaveEndedFile() || f.sources.next().kind != NEWLINE);
+            while (f.sources.position().fileName != "main") {
+                (void)f.sources.next();
+                (void)f.sources.leaveEndedFile();
+            }
+        }
+    }
+
+    [[nodiscard]] std::string entered(std::string_view name) {
+        return finder.enter(name, Brackets) ? std::string(f.sources.position().fileName) : "none";
+    }
+};
+
+TEST(FileFinder, OmitsAttemptsThatAreKnownToFail) {
+    MissingFixture i;
+    i.directory.write("one/b.h", "in one\n");
+    const std::string found = i.entered("b.h");
+    EXPECT_TRUE(found == i.directory.nameOf("two/b.h") || found == i.directory.nameOf("one/b.h"));
+    i.beginMoment();
+    EXPECT_EQ(i.entered("b.h"), i.directory.nameOf("one/b.h"));
+}
+
+TEST(FileFinder, MakesEachAttemptBeforeItSaysThatThereIsNoFile) {
+    MissingFixture i;
+    EXPECT_EQ(i.entered("c.h"), "none");
+    i.directory.write("one/c.h", "in one\n");
+    EXPECT_EQ(i.entered("c.h"), i.directory.nameOf("one/c.h"));
+}
+
+TEST(FileFinder, BeginsAMomentWhenItMeetsAFileThatIsYoungerThanTheMoment) {
+    constexpr std::int64_t kSecond = 1'000'000'000;
+    FinderFixture i({.settlingTime = kSecond});
+    const std::size_t before = i.finder.moment();
+    EXPECT_TRUE(i.finder.enter("a.h", Brackets));
+    EXPECT_NE(i.finder.moment(), before);
 }
 
 }  // namespace
