@@ -1,18 +1,33 @@
 // SPDX-License-Identifier: MIT
 #include "lex/text_masks.h"
 
+#if __has_include(<sys/platform/x86.h>)
+#include <sys/platform/x86.h>
+#endif
+
 namespace umpre {
 namespace {
 
-[[nodiscard]] TextMaskFinder fastestFinder() noexcept {
-#if defined(__x86_64__)
-    const TextMaskFinder wide = wideTextMaskFinder();
-    if (wide != nullptr && __builtin_cpu_supports("avx2") != 0
-        && __builtin_cpu_supports("popcnt") != 0 && __builtin_cpu_supports("pclmul") != 0) {
-        return wide;
-    }
+#if __has_include(<sys/platform/x86.h>)
+// The C library has asked the processor already. To ask it once more takes long in virtual
+// machines.
+[[nodiscard]] bool hasWideVectors() noexcept {
+    return CPU_FEATURE_ACTIVE(AVX2) && CPU_FEATURE_ACTIVE(POPCNT) && CPU_FEATURE_ACTIVE(PCLMULQDQ);
+}
+#elif defined(__x86_64__)
+[[nodiscard]] bool hasWideVectors() noexcept {
+    return __builtin_cpu_supports("avx2") != 0 && __builtin_cpu_supports("popcnt") != 0
+           && __builtin_cpu_supports("pclmul") != 0;
+}
+#else
+[[nodiscard]] bool hasWideVectors() noexcept {
+    return false;
+}
 #endif
-    return baseTextMaskFinder();
+
+[[nodiscard]] TextMaskFinder fastestFinder() noexcept {
+    const TextMaskFinder wide = wideTextMaskFinder();
+    return wide != nullptr && hasWideVectors() ? wide : baseTextMaskFinder();
 }
 
 }  // namespace

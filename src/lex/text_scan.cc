@@ -158,7 +158,7 @@ void TextScan::passAt(Block& block, const char* place) {
     case '\\':
         if (isLineEndByte(place[1])) {
             stop(TextMark::Continuation);
-        } else if (place[1] == '"') {
+        } else if (place[1] == '"' && !literals_.isOpen(place + 1)) {
             block.end(place + 1, TextMark::End, place + 1);
         }
         return;
@@ -203,7 +203,10 @@ void TextScan::passLiteral(Block& block, const char* quote) {
 // Double quotes in a character literal belong to no string, which the masks do not know: if their
 // number is odd, the block ends.
 void TextScan::passCharacter(Block& block, const char* quote) {
-    const char* const end = literals_.isOpen(quote) ? nullptr : map_.characterEnd(quote, end_);
+    if (literals_.isOpen(quote)) {
+        return;
+    }
+    const char* const end = map_.characterEnd(quote, end_);
     if (end == nullptr) {
         passLiteral(block, quote);
         return;
