@@ -26,14 +26,4 @@ std::size_t TextPass::commit(const char* place) {
     return lineFeeds;
 }
 
-CommentScan scanComment(const char* at, const char* end) noexcept {
-    if (at[1] == '*') {
-        return scanBlockComment(at + 2, end);
-    }
-    const char* const lineEnd = findLineEnd(at + 2, end);
-    // A carriage return that ends the input belongs to the comment.
-    const bool isKnown = lineEnd != end && (*lineEnd == '\n' || lineEnd + 1 != end);
-    return {isKnown ? CommentScan::Stop::Closed : CommentScan::Stop::Cut, lineEnd, 0};
-}
-
 }  // namespace umpre

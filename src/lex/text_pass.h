@@ -5,9 +5,9 @@
 #include <cstddef>
 #include <string_view>
 
-#include "lex/comment.h"
 #include "lex/cpp_file_scanner.h"
 #include "lex/name_filter.h"
+#include "lex/text_map.h"
 #include "lex/text_scan.h"
 
 namespace umpre {
@@ -32,6 +32,11 @@ public:
     /// Counts lines of the file that the scan did not see.
     void countLines(std::size_t count) noexcept { lines_ += count; }
 
+    /// Returns the comment that begins at `comment`, as TextMap does.
+    [[nodiscard]] TextMap::Comment commentAt(const char* comment) {
+        return file_.textMap().commentAt(comment, end());
+    }
+
     /// Passes over the continuation that the scan stopped at.
     void passContinuation(bool atLineStart) noexcept;
 
@@ -51,10 +56,6 @@ private:
     const char* continued_ = nullptr;  // behind the last continuation
     std::size_t lines_ = 0;
 };
-
-/// Returns the comment that begins at `at`. It is cut if it is one for the scanner: one that the
-/// bytes up to `end` do not hold whole, or a line comment whose end they do not tell.
-[[nodiscard]] CommentScan scanComment(const char* at, const char* end) noexcept;
 
 }  // namespace umpre
 

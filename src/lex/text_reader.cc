@@ -15,10 +15,12 @@
 // marker.
 #include "lex/text_reader.h"
 
+#include <algorithm>
 #include <cstddef>
 #include <optional>
+#include <utility>
 
-#include "lex/comment.h"
+#include "lex/byte_block.h"
 #include "lex/spelling.h"
 #include "lex/text_pass.h"
 #include "lex/text_scan.h"
@@ -27,10 +29,14 @@ namespace umpre {
 namespace {
 
 [[nodiscard]] const char* blanksEnd(const char* at, const char* end) noexcept {
-    while (at < end && isBlankByte(*at)) {
-        ++at;
+    using Block = BasicByteBlock<BaseVector, 16>;
+    for (; at < end; at += Block::kSize) {
+        const auto others = ~Block(at).any(' ', '\t', '\v', '\f') & bitsBelow(Block::kSize);
+        if (others != 0) {
+            return std::min(at + firstBit(others), end);
+        }
     }
-    return at;
+    return end;
 }
 
 [[nodiscard]] bool beginsComment(const char* at, const char* end) noexcept {
@@ -71,8 +77,10 @@ private:
     [[nodiscard]] Outcome passCarriageReturn();
 
     [[nodiscard]] Outcome beginLine(const char* start);
-    [[nodiscard]] Beginning beginningOf(const char* start);
+    [[nodiscard]] Outcome beginLine(const char* start, const char* behindBlanks);
+    [[nodiscard]] Beginning beginningOf(const char* behindBlanks);
     void beginText(const char* start, const Beginning& beginning);
+    void writeBlanks(const char* start, const char* first);
     [[nodiscard]] const char* endBlankLine(const char* start, const Beginning& beginning);
     [[nodiscard]] const char* endLine(const char* lineEnd);
     void passCommentLines(std::size_t count);
@@ -88,7 +96,8 @@ private:
     OutputWriter& output_;
     CppFileScanner& file_;
     TextPass pass_;
-    const char* run_;  // what is not written yet begins here
+    std::size_t lineFeeds_ = 0;  // to be written before the run
+    const char* run_;            // what else is not written yet begins here
     bool inStep_ = true;
 };
 
@@ -156,17 +165,17 @@ TextReader::Pass::Outcome TextReader::Pass::passName() {
 TextReader::Pass::Outcome TextReader::Pass::passComment() {
     const char* const at = pass_.at();
     if (const char* const start = pass_.scan().lineStart(at); start != nullptr) {
-        return beginLine(start);
+        return beginLine(start, at);
     }
-    const CommentScan comment = scanComment(at, pass_.end());
-    if (comment.stop != CommentScan::Stop::Closed) {
+    const TextMap::Comment comment = pass_.commentAt(at);
+    if (comment.end == nullptr) {
         return stop(at, Stop::InLine);
     }
     writeUpTo(at);
     passCommentLines(comment.lineFeeds);
     output_.write(" ");
-    run_ = comment.at;
-    pass_.scan().resume(comment.at, false);
+    run_ = comment.end;
+    pass_.scan().resume(comment.end, false);
     return std::nullopt;
 }
 
@@ -196,10 +205,14 @@ TextReader::Pass::Outcome TextReader::Pass::passCarriageReturn() {
     return std::nullopt;
 }
 
-// Begins lines until one has text, or is one that needs no look at its beginning.
 TextReader::Pass::Outcome TextReader::Pass::beginLine(const char* start) {
+    return beginLine(start, blanksEnd(start, pass_.end()));
+}
+
+// Begins lines until one has text, or is one that needs no look at its beginning.
+TextReader::Pass::Outcome TextReader::Pass::beginLine(const char* start, const char* behindBlanks) {
     for (;;) {
-        const Beginning beginning = beginningOf(start);
+        const Beginning beginning = beginningOf(behindBlanks);
         const char* const first = beginning.first;
         if (first == nullptr || first == pass_.end()) {
             return stop(start, Stop::LineStart);
@@ -215,39 +228,32 @@ TextReader::Pass::Outcome TextReader::Pass::beginLine(const char* start) {
             return std::nullopt;
         }
         start = endBlankLine(start, beginning);
-        if (inStep_ && !beginsComment(blanksEnd(start, pass_.end()), pass_.end())) {
+        behindBlanks = blanksEnd(start, pass_.end());
+        if (inStep_ && !beginsComment(behindBlanks, pass_.end())) {
             pass_.scan().resume(start, true);
             return std::nullopt;
         }
     }
 }
 
-// Looks at what a line begins with. Nothing is done yet about the comments there.
-TextReader::Pass::Beginning TextReader::Pass::beginningOf(const char* start) {
+// Looks at what a line begins with behind its first blanks. Nothing is done yet about the comments
+// there.
+TextReader::Pass::Beginning TextReader::Pass::beginningOf(const char* behindBlanks) {
     const char* const end = pass_.end();
     Beginning beginning;
-    std::string& blanks = reader_.blanks_;
-    blanks.clear();
-    const char* at = start;
-    for (;;) {
-        const char* const next = blanksEnd(at, end);
-        if (!beginsComment(next, end)) {
-            if (beginning.hasComments) {
-                blanks.append(at, next);
-            }
-            const bool isContinuation = next < end && *next == '\\' && isLineEndByte(next[1]);
-            beginning.first = isContinuation ? nullptr : next;
-            return beginning;
-        }
-        const CommentScan comment = scanComment(next, end);
-        if (comment.stop != CommentScan::Stop::Closed) {
+    const char* next = behindBlanks;
+    while (beginsComment(next, end)) {
+        const TextMap::Comment comment = pass_.commentAt(next);
+        if (comment.end == nullptr) {
             return {};
         }
-        blanks.append(at, next).push_back(' ');
         beginning.hasComments = true;
         beginning.commentLines += comment.lineFeeds;
-        at = comment.at;
+        next = *comment.end == '\n' ? comment.end : blanksEnd(comment.end, end);
     }
+    const bool isContinuation = next < end && *next == '\\' && isLineEndByte(next[1]);
+    beginning.first = isContinuation ? nullptr : next;
+    return beginning;
 }
 
 void TextReader::Pass::beginText(const char* start, const Beginning& beginning) {
@@ -259,19 +265,39 @@ void TextReader::Pass::beginText(const char* start, const Beginning& beginning) 
         setInStep(true);
     }
     if (beginning.hasComments) {
-        output_.write(reader_.blanks_);
+        writeBlanks(start, beginning.first);
         run_ = beginning.first;
     }
     pass_.scan().resume(beginning.first, false);
 }
 
+// Writes the blanks from a line's start to its first token, where comments are among them.
+void TextReader::Pass::writeBlanks(const char* start, const char* first) {
+    const char* at = start;
+    for (;;) {
+        const char* const next = blanksEnd(at, first);
+        output_.write({at, static_cast<std::size_t>(next - at)});
+        if (next == first) {
+            return;
+        }
+        output_.write(" ");
+        at = pass_.commentAt(next).end;
+    }
+}
+
 // Returns where the next line begins.
 const char* TextReader::Pass::endBlankLine(const char* start, const Beginning& beginning) {
     if (beginning.first != start) {
-        writeUpTo(start);
+        if (run_ != start) {
+            writeUpTo(start);
+        }
         run_ = beginning.first;
     }
     passCommentLines(beginning.commentLines);
+    if (*run_ == '\n' && run_ == beginning.first) {
+        ++lineFeeds_;
+        ++run_;
+    }
     return endLine(beginning.first);
 }
 
@@ -307,6 +333,7 @@ TextReader::Stop TextReader::Pass::stop(const char* place, Stop stop) {
 }
 
 void TextReader::Pass::writeUpTo(const char* place) {
+    output_.writeLineFeeds(std::exchange(lineFeeds_, 0));
     if (place > run_) {
         output_.write({run_, static_cast<std::size_t>(place - run_)});
         run_ = place;

@@ -2,7 +2,6 @@
 #ifndef UMPRE_LEX_TEXT_READER_H
 #define UMPRE_LEX_TEXT_READER_H
 
-#include <string>
 #include <string_view>
 
 #include "lex/cpp_file_scanner.h"
@@ -41,7 +40,6 @@ private:
     const NameFilter& macroNames_;
     NameReader& nameReader_;
     std::string_view name_;
-    std::string blanks_;  // of a line that begins with comments
 };
 
 }  // namespace umpre
