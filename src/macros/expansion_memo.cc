@@ -20,7 +20,7 @@ std::optional<std::string_view> ExpansionMemo::workedOut(const MacroName& name) 
     if (isTold && size_ + text_.view().size() > kMostKept) {
         return text_.view();
     }
-    Macro::Expansion& expansion = name.macro.expansion;
+    Expansion& expansion = name.expansion;
     expansion = {version_, isTold ? kept(text_.view()) : std::string_view()};
     return isTold ? std::optional(expansion.text) : std::nullopt;
 }

@@ -24,7 +24,7 @@ public:
     /// Returns what an object-like macro comes out as; nothing if the expander does not tell. Valid
     /// until the next call.
     [[nodiscard]] std::optional<std::string_view> textOf(const MacroName& name) {
-        const Macro::Expansion& expansion = name.macro.expansion;
+        const Expansion& expansion = name.expansion;
         if (expansion.version != macros_.version()) {
             return workedOut(name);
         }

@@ -2,6 +2,7 @@
 #ifndef UMPRE_MACROS_MACRO_H
 #define UMPRE_MACROS_MACRO_H
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <memory>
@@ -45,15 +46,6 @@ public:
 
     void noteUse() const noexcept { wasUsed_ = true; }
 
-    /// What an object-like macro comes out as in text, as of a version of the table; without bytes
-    /// if that has to be read token by token.
-    struct Expansion {
-        std::uint64_t version = 0;
-        std::string_view text;
-    };
-
-    mutable Expansion expansion;
-
     /// The text made ready for use, of an object-like macro and of a function-like one; nothing
     /// until that is worth keeping.
     mutable SharedText tokens;
@@ -75,9 +67,19 @@ private:
     mutable bool wasUsed_ = false;
 };
 
-/// A name that was defined at least once, and its last definition. What a use in text mostly looks
-/// at stands in the first of two cache lines.
+/// What an object-like macro comes out as in text, as of a version of the table; without bytes if
+/// that has to be read token by token.
+struct Expansion {
+    std::uint64_t version = 0;
+    std::string_view text;
+};
+
+/// A name that was defined at least once, and its last definition. Large inputs use names that lie
+/// far apart, so what a use in text looks at stands in two cache lines that follow each other.
 struct alignas(64) MacroName : Name {
+    mutable Expansion expansion;
+    /// The bytes of a name that they suffice for.
+    std::array<char, 64> shortName;
     Macro macro;
 };
 

@@ -132,10 +132,18 @@ void MacroTable::noteChange(std::string_view name) {
 std::size_t MacroTable::slotOf(std::string_view name, std::uint32_t hash) {
     const std::size_t mask = slots_.size() - 1;
     std::size_t at = hash & mask;
-    while (slots_[at].number != 0 && (slots_[at].hash != hash || nameIn(slots_[at]).text != name)) {
+    while (slots_[at].number != 0 && (slots_[at].hash != hash || !holds(slots_[at], name))) {
         at = (at + 1) & mask;
     }
     return at;
+}
+
+// Tells whether a slot is that of a name. Both cache lines that this looks at are asked for at
+// once.
+bool MacroTable::holds(Slot slot, std::string_view name) {
+    const MacroName& entry = nameIn(slot);
+    __builtin_prefetch(entry.shortName.data());
+    return entry.text == name;
 }
 
 MacroName& MacroTable::enter(std::string_view name) {
@@ -147,8 +155,10 @@ MacroName& MacroTable::enter(std::string_view name) {
             at = slotOf(name, hash);
         }
         slots_[at] = {hash, static_cast<std::uint32_t>(++nameCount_)};
-        char* const bytes = newBytes(name.size());
-        newName().text = {bytes, name.copy(bytes, name.size())};
+        MacroName& added = newName();
+        char* const bytes =
+            name.size() <= added.shortName.size() ? added.shortName.data() : newBytes(name.size());
+        added.text = {bytes, name.copy(bytes, name.size())};
     }
     return nameIn(slots_[at]);
 }

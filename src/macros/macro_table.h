@@ -85,6 +85,7 @@ private:
     }
 
     [[nodiscard]] std::size_t slotOf(std::string_view name, std::uint32_t hash);
+    [[nodiscard]] bool holds(Slot slot, std::string_view name);
     [[nodiscard]] MacroName& enter(std::string_view name);
     [[nodiscard]] MacroName& newName();
     [[nodiscard]] char* newBytes(std::size_t size);
