@@ -11,6 +11,7 @@
 #include "macros/macro_body.h"
 
 #include <algorithm>
+#include <array>
 #include <optional>
 #include <string_view>
 #include <unordered_map>
@@ -21,16 +22,57 @@ namespace {
 
 using enum TokenKind;
 
+// Of most bodies the steps and the operands.
+constexpr std::size_t kUsualSteps = 8;
+
+// The names of a macro's parameters. Of two with one name, the last counts.
+class ParameterNames {
+public:
+    explicit ParameterNames(const Macro& macro) {
+        std::string_view names = macro.parameters();
+        const std::size_t count = macro.parameterCount();
+        for (std::size_t index = 0; index < count; ++index) {
+            const std::size_t size = std::min(names.find(','), names.size());
+            add(names.substr(0, size), index);
+            names.remove_prefix(std::min(size + 1, names.size()));
+        }
+    }
+
+    // Returns the number of the parameter of this name.
+    [[nodiscard]] std::optional<std::size_t> find(std::string_view name) const {
+        if (const auto it = others_.find(name); it != others_.end()) {
+            return it->second;
+        }
+        for (std::size_t index = fewSize_; index > 0; --index) {
+            if (few_[index - 1] == name) {
+                return index - 1;
+            }
+        }
+        return std::nullopt;
+    }
+
+private:
+    void add(std::string_view name, std::size_t index) {
+        if (index < few_.size()) {
+            few_[index] = name;
+            fewSize_ = index + 1;
+        } else {
+            others_[name] = index;
+        }
+    }
+
+    // A few names are found soonest by looking at each.
+    std::array<std::string_view, 8> few_;
+    std::size_t fewSize_ = 0;
+    std::unordered_map<std::string_view, std::size_t> others_;
+};
+
 class BodyBuilder {
 public:
     BodyBuilder(const Macro& macro, const LexedText& text, MacroBody& body)
-        : text_(text), body_(body), tokens_(body.tokens.edit()) {
-        std::string_view names = macro.parameters();
-        for (std::size_t index = 0; index < macro.parameterCount(); ++index) {
-            const std::size_t size = std::min(names.find(','), names.size());
-            parameters_[names.substr(0, size)] = index;  // of two with one name, the last counts
-            names.remove_prefix(std::min(size + 1, names.size()));
-        }
+        : text_(text), body_(body), tokens_(body.tokens.edit()), parameters_(macro) {
+        body.steps.reserve(kUsualSteps);
+        body.operands.reserve(kUsualSteps);
     }
 
     void build() {
@@ -127,11 +169,7 @@ private:
     }
 
     [[nodiscard]] std::optional<std::size_t> parameterAt(std::size_t index) const {
-        const auto it = parameters_.find(text_.text(index));
-        if (!isName(text_.kind(index)) || it == parameters_.end()) {
-            return std::nullopt;
-        }
-        return it->second;
+        return isName(text_.kind(index)) ? parameters_.find(text_.text(index)) : std::nullopt;
     }
 
     void writeHeld() {
@@ -174,10 +212,10 @@ private:
         failed_ = true;
     }
 
-    std::unordered_map<std::string_view, std::size_t> parameters_;  // to their numbers
     const LexedText& text_;
     MacroBody& body_;
     LexedText& tokens_;
+    ParameterNames parameters_;
     std::size_t at_ = 0;
     std::size_t effectsNoted_ = 0;
     std::optional<Held> held_;
@@ -234,14 +272,13 @@ const MacroBody& BodyMaker::bodyOf(const Macro& macro) {
     if (macro.body == nullptr) {
         auto body = std::make_shared<MacroBody>();
         body->tokens = SharedText::alone();
-        LexedText source;
-        lexer_.append(source, macro.text());
-        macros_.enterNames(source);
-        BodyBuilder(macro, source, *body).build();
-        body->isPlain = isPlainText(source);
+        const SharedText source = lexer_.lexed(macro.text());
+        macros_.enterNames(source.edit());
+        BodyBuilder(macro, *source, *body).build();
+        body->isPlain = isPlainText(*source);
         noteNames(*body);
-        if (source.hasEffects()) {
-            body->source = std::move(source);
+        if (source->hasEffects()) {
+            body->source = source;
         }
         macro.body = std::move(body);
     }

@@ -48,7 +48,7 @@ struct BodyOperand {
 struct MacroBody {
     SharedText tokens;
     // For function-like macros only:
-    LexedText source;  // the text as lexed, if reading it has effects
+    SharedText source;  // the text as lexed, if reading it has effects
     std::vector<BodyStep> steps;
     std::vector<BodyOperand> operands;
     std::vector<const Name*> names;  // of the tokens that stay as they are

@@ -28,7 +28,7 @@ Argument* Substitution::takeStep(Invocation& invocation, const BodyStep& step) {
     case BodyStep::Kind::Tokens:
         invocation.replacement.append(*body.tokens, step.first, step.last, invocation.noExpand);
         break;
-    case BodyStep::Kind::Effects: sources_.carryOutEffects(body.source, step.first); break;
+    case BodyStep::Kind::Effects: sources_.carryOutEffects(*body.source, step.first); break;
     case BodyStep::Kind::Argument:
         if (!addArgument(invocation, invocation.arguments[step.first])) {
             return &invocation.arguments[step.first];
