@@ -1,7 +1,9 @@
 // SPDX-License-Identifier: MIT
 #include "macros/argument_texts.h"
 
+#include <algorithm>
 #include <array>
+#include <functional>
 
 #include "lex/plain_text.h"
 
@@ -37,11 +39,12 @@ constexpr std::array<Byte, 256> kBytes = [] {
 
 class Reader {
 public:
-    Reader(const char* end, const NameFilter& macroNames) : end_(end), macroNames_(macroNames) {}
+    Reader(const char* end, const NameFilter& macroNames, CallOutline& outline)
+        : end_(end), macroNames_(macroNames), outline_(outline), makesOutline_(outline.begin()) {}
 
     /// Reads one argument, from its first byte to the "," or ")" that ends it. Returns null if it
     /// does not stand as it should.
-    [[nodiscard]] const char* read(const char* at, ArgumentText& argument) const {
+    [[nodiscard]] const char* read(const char* at, ArgumentText& argument) {
         const char* const begin = at;
         std::size_t depth = 0;
         while (at != nullptr && at < end_) {
@@ -62,9 +65,7 @@ public:
                     argument.raw = {begin, static_cast<std::size_t>(at - begin)};
                     return at;
                 }
-                depth += *at == '(' ? 1 : 0;
-                depth -= *at == ')' ? 1 : 0;
-                ++at;
+                at = passDelimiter(at, depth, argument);
                 break;
             case Byte::Number:
             case Byte::Unusual: at = unusualTokenEnd(at, end_); break;
@@ -81,6 +82,26 @@ private:
         return behind;
     }
 
+    [[nodiscard]] const char* passDelimiter(const char* at, std::size_t& depth,
+                                            ArgumentText& argument) {
+        if (*at == '(') {
+            const char* const close = makesOutline_ ? nullptr : outline_.closing(at);
+            if (close != nullptr) {
+                argument.mayHaveMacros = true;
+                return close + 1;
+            }
+            ++depth;
+        } else if (*at == ')') {
+            --depth;
+        }
+        if (makesOutline_ && *at == '(') {
+            outline_.noteOpen(at);
+        } else if (makesOutline_ && *at == ')') {
+            outline_.noteClosed(at);
+        }
+        return at + 1;
+    }
+
     // Returns where blanks end, or null if they are neither one space nor at the argument's end.
     [[nodiscard]] const char* passBlanks(const char* at, std::size_t depth) const {
         const char* const behind = skipBlanks(at, end_);
@@ -94,13 +115,24 @@ private:
 
     const char* end_;
     const NameFilter& macroNames_;
+    CallOutline& outline_;
+    bool makesOutline_;
 };
 
 }  // namespace
 
+const char* CallOutline::closing(const char* open) const {
+    const auto standsBefore = [](const Parenthesis& one, const char* at) {
+        return std::less<>()(one.open, at);
+    };
+    const auto it = std::lower_bound(parentheses_.begin(), parentheses_.end(), open, standsBefore);
+    return it != parentheses_.end() && it->open == open ? it->close : nullptr;
+}
+
 const char* takeArgumentTexts(const char* open, const char* end, std::size_t count,
-                              const NameFilter& macroNames, std::vector<ArgumentText>& arguments) {
-    const Reader reader(end, macroNames);
+                              const NameFilter& macroNames, CallOutline& outline,
+                              std::vector<ArgumentText>& arguments) {
+    Reader reader(end, macroNames, outline);
     const char* at = open + 1;
     for (std::size_t taken = 0;; ++taken) {
         at = skipBlanks(at, end);

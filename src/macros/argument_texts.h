@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "lex/name_filter.h"
@@ -21,12 +22,52 @@ struct ArgumentText {
     bool hasMacros = false;      ///< names of macros were left in the expansion
 };
 
+/// Where the parentheses in the arguments of a call close, so that a call in them is passed over
+/// without reading it again: else calls in calls would cost the square of their depth.
+class CallOutline {
+public:
+    void clear() noexcept {
+        parentheses_.clear();
+        open_.clear();
+        isBegun_ = false;
+    }
+
+    /// Returns true once.
+    [[nodiscard]] bool begin() noexcept { return !std::exchange(isBegun_, true); }
+
+    /// Notes a "(" or ")" that stands behind those noted before.
+    void noteOpen(const char* at) {
+        open_.push_back(parentheses_.size());
+        parentheses_.push_back({at, nullptr});
+    }
+
+    void noteClosed(const char* at) {
+        parentheses_[open_.back()].close = at;
+        open_.pop_back();
+    }
+
+    /// Returns the ")" of a "(", or null if that is not known.
+    [[nodiscard]] const char* closing(const char* open) const;
+
+private:
+    struct Parenthesis {
+        const char* open;
+        const char* close;
+    };
+
+    std::vector<Parenthesis> parentheses_;
+    std::vector<std::size_t> open_;
+    bool isBegun_ = false;
+};
+
 /// Adds the arguments of a call as views of its bytes, behind which eight more can be read. Returns
 /// the end of the call whose "(" is at `open`, or null if that is not told by the bytes before
 /// `end`: the call goes on behind them or over a line end, its arguments are not `count`, or one of
 /// them does not stand as it should.
+/// The first call makes the `outline`, for those in its arguments; it must be cleared before their
+/// bytes are other ones.
 [[nodiscard]] const char* takeArgumentTexts(const char* open, const char* end, std::size_t count,
-                                            const NameFilter& macroNames,
+                                            const NameFilter& macroNames, CallOutline& outline,
                                             std::vector<ArgumentText>& arguments);
 
 }  // namespace umpre

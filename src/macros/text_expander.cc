@@ -33,7 +33,7 @@ namespace umpre {
 namespace {
 
 // The token road has quicker ways to nest deeply, and takes no memory for what is large.
-constexpr std::size_t kDeepest = 32;
+constexpr std::size_t kDeepest = 128;
 constexpr std::size_t kMostWork = std::size_t{8} << 20U;  // bytes
 constexpr std::size_t kWorkOfReading = 16;
 
@@ -51,6 +51,7 @@ void TextExpander::begin(bool watches) noexcept {
     work_ = 0;
     around_.clear();
     arguments_.clear();
+    outline_.clear();
     buffersUsed_ = 0;
 }
 
@@ -176,8 +177,8 @@ const char* TextExpander::replaceCall(const MacroName& name, const char* open, c
                                       Place place, Result& result) {
     const std::size_t argumentsBefore = arguments_.size();
     const std::size_t buffersBefore = buffersUsed_;
-    const char* const behind =
-        takeArgumentTexts(open, end, name.macro.parameterCount(), macros_.filter(), arguments_);
+    const char* const behind = takeArgumentTexts(open, end, name.macro.parameterCount(),
+                                                 macros_.filter(), outline_, arguments_);
     const MacroBody& body = bodies_.bodyOf(name.macro);
     if (behind == nullptr || !body.isPlain) {
         return nullptr;

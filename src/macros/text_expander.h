@@ -89,6 +89,7 @@ private:
     std::size_t work_ = 0;                  // bytes read and written for one name of the text
     std::vector<const MacroName*> around_;  // whose replacements are read, the innermost one last
     std::vector<ArgumentText> arguments_;   // of the calls that are replaced
+    CallOutline outline_;                   // of the arguments of the call in the text
     std::vector<std::unique_ptr<TextBuffer>> buffers_;  // the first of them in use
     std::size_t buffersUsed_ = 0;
     std::string literal_;

@@ -687,6 +687,21 @@ TEST(Roads, AgreeOnMacrosUsedAgain) {
     });
 }
 
+TEST(Roads, AgreeOnCallsInCalls) {
+    for (const std::size_t depth : {3U, 30U, 200U}) {
+        std::string calls = "N";
+        for (std::size_t level = 0; level < depth; ++level) {
+            calls = level % 3 == 0   ? "F(" + calls + ")"
+                    : level % 3 == 1 ? "H((" + calls + "), (a)b)"
+                                     : "H(x, " + calls + " (c))";
+        }
+        expectSameOnAllRoads(
+            "#define N 1\n#define F(x) [x]\n#define H(a,b) b (a)\n#define O F(F(H(F(2),(3)))) "
+            "F(4)\n"
+            + calls + "\nO F(O) " + calls + "\n");
+    }
+}
+
 TEST(Roads, AgreeOnCalls) {
     std::string definitions =
         "#define F(x) [x]\n#define G() 0\n#define H(a,b) a b\n#define J(a,b) a##b\n"

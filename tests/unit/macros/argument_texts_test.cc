@@ -15,10 +15,12 @@ namespace {
 [[nodiscard]] std::string argumentsOf(std::string_view text, std::size_t count) {
     NameFilter names;
     names.add("N");
+    CallOutline outline;
     std::vector<ArgumentText> arguments;
     const std::string padded = std::string(text) + "        ";
     const char* const end = padded.data() + text.size();
-    const char* const behind = takeArgumentTexts(padded.data(), end, count, names, arguments);
+    const char* const behind =
+        takeArgumentTexts(padded.data(), end, count, names, outline, arguments);
     if (behind == nullptr) {
         return "(not told)";
     }

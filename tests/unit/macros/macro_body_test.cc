@@ -37,7 +37,7 @@ using enum TokenKind;
         return "'" + text + "'";
     case BodyStep::Kind::Effects: {
         testing::RecordingCommentSink comments;
-        body.source.carryOutEffects(step.first, comments);
+        body.source->carryOutEffects(step.first, comments);
         return comments.effects();
     }
     case BodyStep::Kind::Argument: return "argument " + std::to_string(step.first);
@@ -280,9 +280,9 @@ TEST(MacroBody, KeepsTheSourceOnlyIfReadingItHasEffects) {
     TextLexer lexer;
     MacroTable macros;
     const Macro& plain = defined(macros, {"a /* b */ x", "x", true});
-    EXPECT_EQ(BodyMaker(lexer, macros).bodyOf(plain).source.size(), 0U);
+    EXPECT_FALSE(BodyMaker(lexer, macros).bodyOf(plain).source);
     const Macro& withEffects = defined(macros, {"a /*\n*/ x", "x", true});
-    EXPECT_TRUE(BodyMaker(lexer, macros).bodyOf(withEffects).source.hasEffects());
+    EXPECT_TRUE(BodyMaker(lexer, macros).bodyOf(withEffects).source->hasEffects());
 }
 
 }  // namespace
