@@ -84,6 +84,7 @@ Outcome Definitions::defineDirective(DirectiveLine& line) {
     if (!isName(name.kind)) {
         return Outcome::Untold;
     }
+    macros_.prefetch(name.text);
     const bool functionLike = line.peekByte() == '(';
     parameters_.clear();
     if (functionLike && readParameters(line, parameters_) != nullptr) {

@@ -38,9 +38,9 @@ ExprValue Evaluator<Tokens>::operand() {
         case BANG:
         case TILDE:
         case PLUS:
-        case MINUS: pending_.push_back({Pending::Kind::Unary, kind, {}, {}}); break;
+        case MINUS: pending_.push_back({Pending::Kind::Unary, kind, 0, {}, {}}); break;
         case LEFT_PARENTHESIS:
-            pending_.push_back({Pending::Kind::Parenthesis, kind, {}, {}});
+            pending_.push_back({Pending::Kind::Parenthesis, kind, 0, {}, {}});
             break;
         default: return primary(kind);
         }
@@ -109,13 +109,13 @@ bool Evaluator<Tokens>::isComplete(ExprValue& value) {
         if (precedence > 0) {
             applyBinaries(precedence, value);
             tokens_.next();
-            pending_.push_back({Pending::Kind::Binary, kind, value, {}});
+            pending_.push_back({Pending::Kind::Binary, kind, precedence, value, {}});
             return false;
         }
         applyBinaries(1, value);
         if (kind == QUESTION) {
             tokens_.next();
-            pending_.push_back({Pending::Kind::Middle, kind, value, {}});
+            pending_.push_back({Pending::Kind::Middle, kind, 0, value, {}});
             return false;
         }
     } while (closesBracket(value));
@@ -167,8 +167,7 @@ void Evaluator<Tokens>::applyTightest(ExprValue& value) {
 // Applies the binary operators before the value that bind at least that tightly.
 template <typename Tokens>
 void Evaluator<Tokens>::applyBinaries(int precedence, ExprValue& value) {
-    while (!pending_.empty() && pending_.back().kind == Pending::Kind::Binary
-           && precedenceOf(pending_.back().operation) >= precedence) {
+    while (!pending_.empty() && pending_.back().precedence >= precedence) {
         value = applyBinary(pending_.back().operation, pending_.back().value, value);
         pending_.pop_back();
     }

@@ -31,6 +31,7 @@ private:
         enum class Kind { Unary, Binary, Parenthesis, Middle, Third };
         Kind kind = Kind::Unary;
         TokenKind operation = TokenKind::END_OF_INPUT;  // of Unary and Binary
+        int precedence = 0;                             // of Binary
         ExprValue value;   // left operand; of Middle and Third, the condition
         ExprValue middle;  // of Third
     };

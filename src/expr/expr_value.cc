@@ -1,6 +1,9 @@
 // SPDX-License-Identifier: MIT
 #include "expr/expr_value.h"
 
+#include <array>
+#include <cstddef>
+#include <cstdint>
 #include <limits>
 
 namespace umpre {
@@ -63,18 +66,7 @@ constexpr std::uint32_t kShiftMask = 31;  // counts are taken modulo 32
     }
 }
 
-}  // namespace
-
-ExprValue applyUnary(TokenKind operation, ExprValue operand) noexcept {
-    switch (operation) {
-    case BANG: return {operand.value == 0 ? 1U : 0U, operand.isSigned};
-    case TILDE: return {~operand.value, operand.isSigned};
-    case MINUS: return {0U - operand.value, operand.isSigned};
-    default: return operand;
-    }
-}
-
-int precedenceOf(TokenKind operation) noexcept {
+[[nodiscard]] constexpr int precedence(TokenKind operation) noexcept {
     switch (operation) {
     case OROR: return 1;
     case ANDAND: return 2;
@@ -96,6 +88,29 @@ int precedenceOf(TokenKind operation) noexcept {
     case PERCENT: return kTightest;
     default: return 0;
     }
+}
+
+constexpr std::array<std::int8_t, 512> kPrecedences = [] {
+    std::array<std::int8_t, 512> precedences{};
+    for (std::size_t kind = 0; kind < precedences.size(); ++kind) {
+        precedences[kind] = static_cast<std::int8_t>(precedence(static_cast<TokenKind>(kind)));
+    }
+    return precedences;
+}();
+
+}  // namespace
+
+ExprValue applyUnary(TokenKind operation, ExprValue operand) noexcept {
+    switch (operation) {
+    case BANG: return {operand.value == 0 ? 1U : 0U, operand.isSigned};
+    case TILDE: return {~operand.value, operand.isSigned};
+    case MINUS: return {0U - operand.value, operand.isSigned};
+    default: return operand;
+    }
+}
+
+int precedenceOf(TokenKind operation) noexcept {
+    return kPrecedences[static_cast<std::size_t>(operation)];
 }
 
 ExprValue applyBinary(TokenKind operation, ExprValue left, ExprValue right) {

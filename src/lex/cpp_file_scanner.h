@@ -67,6 +67,12 @@ public:
         return hasPeek() ? std::string_view{} : lexer_.bytesAhead();
     }
 
+    /// Tells whether "#" comes next, and is no "##".
+    [[nodiscard]] bool isAtHash() {
+        const std::string_view bytes = bytesAhead();
+        return !bytes.empty() && bytes[0] == '#' && bytes.data()[1] != '#';
+    }
+
     /// Returns the whole lines among the bytes ahead; at the end of the file, all of them.
     [[nodiscard]] std::string_view wholeLines() {
         return hasPeek() ? std::string_view{} : lexer_.wholeLines();

@@ -13,7 +13,9 @@
 #include <algorithm>
 #include <array>
 #include <cstdint>
+#include <utility>
 
+#include "lex/byte_block.h"
 #include "lex/spelling.h"
 
 namespace umpre {
@@ -81,6 +83,11 @@ DirectiveLine::DirectiveLine(CppFileScanner& file) : file_(file) {
 }
 
 Token DirectiveLine::next() {
+    if (isNameStart(*at_)) {
+        const char* const begin = std::exchange(at_, nameEndAhead(at_));
+        const std::string_view name(begin, static_cast<std::size_t>(at_ - begin));
+        return {kindOfName(name), name};
+    }
     const Token token = tokenAt(at_);
     at_ += isAtEnd() ? 0 : token.text.size();
     return token;
@@ -149,7 +156,15 @@ DirectiveLine::Blanks DirectiveLine::blanksEnd(const char* at) {
 
 // Returns the end of the text that begins at `at` and holds no blanks outside of literals.
 const char* DirectiveLine::runEnd(const char* at) {
+    using Block = BasicByteBlock<BaseVector, 16>;
     for (;;) {
+        const Block block(at);
+        const auto stops = block.blanksAndUnusual() | block.any('"', '\'', '/', '\\');
+        if (stops == 0) {
+            at += Block::kSize;
+            continue;
+        }
+        at += firstBit(stops);
         switch (classOf(*at)) {
         case Class::Plain: ++at; break;
         case Class::Quote: at += std::max<std::size_t>(file_.literalSize(at), 1); break;

@@ -2,6 +2,8 @@
 #ifndef UMPRE_LEX_SPELLING_H
 #define UMPRE_LEX_SPELLING_H
 
+#include <array>
+#include <cstddef>
 #include <string_view>
 
 #include "lex/token.h"
@@ -34,9 +36,17 @@ namespace umpre {
     return byte == '\n' || byte == '\r';
 }
 
+inline constexpr std::array<bool, 256> kIsWordByte = [] {
+    std::array<bool, 256> isWord{};
+    for (std::size_t byte = 0; byte < isWord.size(); ++byte) {
+        isWord[byte] = isWordByte(static_cast<char>(byte));
+    }
+    return isWord;
+}();
+
 /// Returns the end of a name that begins at `at`, or of the rest of one.
 [[nodiscard]] inline const char* nameEnd(const char* at) noexcept {
-    while (isWordByte(*at)) {
+    while (kIsWordByte[static_cast<unsigned char>(*at)]) {
         ++at;
     }
     return at;

@@ -346,6 +346,9 @@ void TextReader::Pass::setInStep(bool isInStep) noexcept {
 }
 
 TextReader::Stop TextReader::copyText(CppFileScanner& file, Stop from) {
+    if (from == Stop::LineStart && file.isAtHash()) {
+        return from;
+    }
     Stop stop = from;
     bool goesOn = true;
     while (goesOn && !output_.failed()) {

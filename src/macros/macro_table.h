@@ -55,6 +55,11 @@ public:
     /// Replaces what a name is defined as. The views must not be of the name's own bytes.
     void replace(MacroName& name, const MacroText& definition);
 
+    /// Says that a name will be looked for soon.
+    void prefetch(std::string_view name) const noexcept {
+        __builtin_prefetch(&slots_[hashOfName(name) & (slots_.size() - 1)]);
+    }
+
     /// Removes a name; does nothing if it is not defined.
     void undefine(std::string_view name);
 

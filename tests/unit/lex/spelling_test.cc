@@ -37,6 +37,15 @@ TEST(Spelling, EndsANameWhereTheRuleDoes) {
         LexedText lexed;
         const std::string_view name = firstToken(lexed, text).text;
         EXPECT_EQ(nameEnd(text.data()), text.data() + name.size()) << text;
+        const std::string padded = text + std::string(16, ' ');
+        EXPECT_EQ(nameEndAhead(padded.data()), padded.data() + name.size()) << text;
+    }
+}
+
+TEST(Spelling, EndsNamesOfAnySize) {
+    for (std::size_t size = 0; size < 70; ++size) {
+        const std::string text = std::string(size, 'n') + std::string(16, ' ');
+        EXPECT_EQ(nameEndAhead(text.data()), text.data() + size);
     }
 }
 
