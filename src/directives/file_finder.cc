@@ -40,7 +40,7 @@ void FileFinder::lookAtClock() {
     clock_ = static_cast<std::size_t>(timeBy(CLOCK_MONOTONIC_COARSE) / kMomentLength);
 }
 
-bool FileFinder::enter(std::string_view name, IncludeForm form) {
+FileFinder::Result FileFinder::enter(std::string_view name, IncludeForm form) {
     entered_ = nullptr;
     searchTime_ = timeBy(CLOCK_REALTIME_COARSE);
     if (searchMoment_ != moment()) {
@@ -53,36 +53,66 @@ bool FileFinder::enter(std::string_view name, IncludeForm form) {
     }
     // That there is no such file must not be said of what was so a moment ago.
     std::size_t omitted = 0;
-    return enter(name, form, &omitted) || (omitted > 0 && enter(name, form, nullptr));
+    const Result result = enter(name, form, &omitted);
+    return result == Result::Nowhere && omitted > 0 ? enter(name, form, nullptr) : result;
 }
 
 // Attempts that are known to fail are omitted and counted, unless `omitted` is null.
-bool FileFinder::enter(std::string_view name, IncludeForm form, std::size_t* omitted) {
+FileFinder::Result FileFinder::enter(std::string_view name, IncludeForm form,
+                                     std::size_t* omitted) {
     for (std::size_t number = 0;; ++number) {
         const std::string* const path = candidate(name, form, number);
         if (path == nullptr) {
-            return false;
+            return Result::Nowhere;
         }
         if (omitted != nullptr && names_.lacks(*path, searchMoment_)) {
             ++*omitted;
-        } else if (enterPath(*path)) {
-            noteEntered(*path, name, form, number);
-            return true;
-        } else if (omitted != nullptr) {
+            continue;
+        }
+        if (std::shared_ptr<KnownFile> file = knownAt(*path); file != nullptr) {
+            keepSearch(name, form, std::move(file), number);
+            return Result::Known;
+        }
+        if (enterPath(*path)) {
+            noteEntered(*path);
+            keepSearch(name, form, entered_, number);
+            return Result::Entered;
+        }
+        if (omitted != nullptr) {
             names_.noteMiss(*path, searchMoment_, searchTime_);
         }
     }
 }
 
-void FileFinder::noteEntered(const std::string& path, std::string_view name, IncludeForm form,
-                             std::size_t attempts) {
+// Returns the file if it is one that was found by another name and need not be opened now.
+std::shared_ptr<KnownFile> FileFinder::knownAt(const std::string& path) const {
+    if (!pathsEntered_.mayHold(path) || !sources_.canOpenOneMore()) {
+        return nullptr;
+    }
+    const auto found = files_.find(path);
+    if (found == files_.end() || !found->second->isAtHand()) {
+        return nullptr;
+    }
+
+    struct stat status {};
+
+    const bool isSame =
+        ::stat(path.c_str(), &status) == 0 && identityOf(status) == found->second->identity;
+    return isSame ? found->second : nullptr;
+}
+
+void FileFinder::noteEntered(const std::string& path) {
     const FileIdentity& identity = sources_.currentFile().identity();
     noteChange(identity);
     entered_ = remember(path, identity);
-    if (entered_ != nullptr) {
+}
+
+void FileFinder::keepSearch(std::string_view name, IncludeForm form,
+                            std::shared_ptr<KnownFile> file, std::size_t attempts) {
+    if (file != nullptr) {
         ByName<Search>& searches = searches_[static_cast<std::size_t>(form)];
         auto& [key, search] = *searches.try_emplace(std::string(name)).first;
-        search = {key, form, entered_, attempts, moment()};
+        search = {key, form, std::move(file), attempts, moment()};
     }
 }
 

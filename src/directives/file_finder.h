@@ -39,6 +39,9 @@ struct KnownFile {
 
     /// Tells whether reading it now would write that text and do nothing else.
     [[nodiscard]] bool isGuarded() const noexcept { return guard != nullptr && guard->isDefined; }
+
+    /// Tells whether it can be included without being opened.
+    [[nodiscard]] bool isAtHand() const noexcept { return isGuarded() || bytes != nullptr; }
 };
 
 /// A search that led to a known file, and what it hangs on.
@@ -89,8 +92,15 @@ public:
         return search.moment == moment() || isStill(search) ? search.file.get() : nullptr;
     }
 
-    /// Looks for a file and enters it. Returns false if it is nowhere.
-    [[nodiscard]] bool enter(std::string_view name, IncludeForm form);
+    /// What became of looking for a file.
+    enum class Result {
+        Nowhere,  ///< there is none
+        Entered,
+        Known,  ///< it is there, but need not be opened; `find` now leads to it
+    };
+
+    /// Looks for a file and enters it if it has to be read.
+    [[nodiscard]] Result enter(std::string_view name, IncludeForm form);
 
     /// Returns what is known of the file that was entered last; null for one that may change at any
     /// time, or that is new.
@@ -108,10 +118,12 @@ private:
     template <typename Value>
     using ByName = std::unordered_map<std::string, Value, Hash, std::equal_to<>>;
 
-    [[nodiscard]] bool enter(std::string_view name, IncludeForm form, std::size_t* omitted);
+    [[nodiscard]] Result enter(std::string_view name, IncludeForm form, std::size_t* omitted);
+    [[nodiscard]] std::shared_ptr<KnownFile> knownAt(const std::string& path) const;
+    void keepSearch(std::string_view name, IncludeForm form, std::shared_ptr<KnownFile> file,
+                    std::size_t attempts);
     [[nodiscard]] bool enterPath(const std::string& path);
-    void noteEntered(const std::string& path, std::string_view name, IncludeForm form,
-                     std::size_t attempts);
+    void noteEntered(const std::string& path);
     void noteChange(const FileIdentity& identity);
     [[nodiscard]] bool open(const std::string& path);
     [[nodiscard]] bool isStill(Search& search);

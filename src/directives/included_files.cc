@@ -14,22 +14,35 @@ void IncludedFiles::open(std::string_view name, IncludeForm form, Search* search
 }
 
 void IncludedFiles::enter(std::string_view name, IncludeForm form) {
-    if (finder_.enter(name, form)) {
-        guards_.fileEntered(finder_.entered());
-    } else {
+    switch (finder_.enter(name, form)) {
+    case FileFinder::Result::Nowhere:
         reporter_.reportError(std::string("Cannot open file: ").append(name));
+        break;
+    case FileFinder::Result::Entered: guards_.fileEntered(finder_.entered()); break;
+    case FileFinder::Result::Known:
+        Search& search = *finder_.find(name, form);
+        if (!passOver(search)) {
+            enter(search);
+        }
+        break;
     }
 }
 
 void IncludedFiles::enter(Search& search) {
+    if (!enterKept(search)) {
+        enter(search.name, search.form);
+    }
+}
+
+bool IncludedFiles::enterKept(Search& search) {
     if (!sources_.canOpenOneMore() || finder_.fileOf(search) == nullptr
         || search.file->bytes == nullptr) {
-        enter(search.name, search.form);
-        return;
+        return false;
     }
     const std::shared_ptr<KnownFile> file = search.file;
     sources_.pushKeptFile(file->name, file->bytes, file->identity);
     guards_.fileEntered(file);
+    return true;
 }
 
 void IncludedFiles::fileEnds() {

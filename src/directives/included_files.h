@@ -78,6 +78,8 @@ public:
     void fileEnds();
 
 private:
+    [[nodiscard]] bool enterKept(Search& search);
+
     ScannerStack& sources_;
     OutputWriter& output_;
     Reporter& reporter_;

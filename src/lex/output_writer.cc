@@ -2,6 +2,7 @@
 #include "lex/output_writer.h"
 
 #include <algorithm>
+#include <array>
 #include <charconv>
 #include <cstring>
 
@@ -73,11 +74,15 @@ void OutputWriter::writeLineMarker(const SourcePosition& position) {
 void OutputWriter::writeLineMarker(std::int32_t line, const Snippet& markerEnd) {
     outputLine_ = line;
     if (kMarkerSize + Snippet::kRoom > kBlockSize - used_) {
-        flush();
+        std::array<char, kMarkerSize + Snippet::kRoom> marker;
+        const char* const end = put(putMarkerBegin(marker.data(), line), markerEnd.text());
+        write({marker.data(), static_cast<std::size_t>(end - marker.data())});
+        return;
     }
     char* const begin = block_.data() + used_;
-    used_ += static_cast<std::size_t>(putMarkerBegin(begin, line) - begin);
-    writeSnippet(markerEnd);
+    char* const end = putMarkerBegin(begin, line);
+    markerEnd.copyTo(end);
+    used_ += static_cast<std::size_t>(end - begin) + markerEnd.size();
 }
 
 std::string OutputWriter::markerOf(const SourcePosition& position) {

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "directives/file_finder.h"
 
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -13,6 +14,7 @@
 namespace umpre {
 namespace {
 
+using enum FileFinder::Result;
 using enum IncludeForm;
 using enum TokenKind;
 
@@ -41,8 +43,8 @@ struct FinderFixture {
 
     // Enters the file so often that it is worth remembering.
     void enterTwice(std::string_view name, IncludeForm form) {
-        EXPECT_TRUE(finder.enter(name, form));
-        EXPECT_TRUE(finder.enter(name, form));
+        EXPECT_EQ(finder.enter(name, form), Entered);
+        EXPECT_EQ(finder.enter(name, form), Entered);
     }
 
     // Returns the name of the file that an earlier search leads to, or what is missing.
@@ -65,10 +67,10 @@ struct FinderFixture {
 
 TEST(FileFinder, KnowsAFileThatWasEnteredTwice) {
     FinderFixture i;
-    EXPECT_TRUE(i.finder.enter("a.h", Brackets));
+    EXPECT_EQ(i.finder.enter("a.h", Brackets), Entered);
     EXPECT_EQ(i.known("a.h", Brackets), "no search");
     EXPECT_EQ(i.finder.entered(), nullptr);
-    EXPECT_TRUE(i.finder.enter("a.h", Brackets));
+    EXPECT_EQ(i.finder.enter("a.h", Brackets), Entered);
     EXPECT_EQ(i.known("a.h", Brackets), i.directory.nameOf("two/a.h"));
     EXPECT_EQ(i.finder.entered()->name, i.directory.nameOf("two/a.h"));
 }
@@ -84,14 +86,14 @@ TEST(FileFinder, KnowsOneFileUnderSeveralNames) {
     FinderFixture i;
     i.enterTwice("a.h", Brackets);
     const std::shared_ptr<KnownFile> file = i.finder.entered();
-    EXPECT_TRUE(i.finder.enter(i.directory.nameOf("two/a.h"), Quotes));
+    EXPECT_EQ(i.finder.enter(i.directory.nameOf("two/a.h"), Quotes), Entered);
     EXPECT_EQ(i.finder.entered(), file);
 }
 
 TEST(FileFinder, KnowsNothingOfAFileThatIsNowhere) {
     FinderFixture i;
-    EXPECT_FALSE(i.finder.enter("none.h", Brackets));
-    EXPECT_FALSE(i.finder.enter("none.h", Brackets));
+    EXPECT_EQ(i.finder.enter("none.h", Brackets), Nowhere);
+    EXPECT_EQ(i.finder.enter("none.h", Brackets), Nowhere);
     EXPECT_EQ(i.known("none.h", Brackets), "no search");
 }
 
@@ -128,7 +130,7 @@ TEST(FileFinder, KnowsNothingOfAnEmptyFile) {
 
 TEST(FileFinder, KnowsNothingOfTheFileThatIsWritten) {
     FinderFixture i;
-    EXPECT_TRUE(i.finder.enter("a.h", Brackets));
+    EXPECT_EQ(i.finder.enter("a.h", Brackets), Entered);
     FileSink sink(i.f.sources.currentFile().identity());
     i.f.output.redirect(sink);
     i.enterTwice("a.h", Brackets);
@@ -143,7 +145,7 @@ TEST(FileFinder, SeesInTheNextMomentThatAFileHasChanged) {
     i.beginMoment();
     EXPECT_EQ(i.known("a.h", Brackets), "no file");
     const std::shared_ptr<KnownFile> before = i.finder.entered();
-    EXPECT_TRUE(i.finder.enter("a.h", Brackets));
+    EXPECT_EQ(i.finder.enter("a.h", Brackets), Entered);
     EXPECT_EQ(i.known("a.h", Brackets), i.directory.nameOf("two/a.h"));
     EXPECT_NE(i.finder.entered(), before);
 }
@@ -151,10 +153,10 @@ TEST(FileFinder, SeesInTheNextMomentThatAFileHasChanged) {
 TEST(FileFinder, BeginsAMomentWhenAFileTurnsOutToHaveChanged) {
     FinderFixture i;
     i.enterTwice("a.h", Brackets);
-    EXPECT_TRUE(i.finder.enter(i.directory.nameOf("two/a.h"), Quotes));
+    EXPECT_EQ(i.finder.enter(i.directory.nameOf("two/a.h"), Quotes), Entered);
     i.directory.write("two/a.h", "something else\n");
     EXPECT_EQ(i.known("a.h", Brackets), i.directory.nameOf("two/a.h"));
-    EXPECT_TRUE(i.finder.enter(i.directory.nameOf("two/a.h"), Quotes));
+    EXPECT_EQ(i.finder.enter(i.directory.nameOf("two/a.h"), Quotes), Entered);
     EXPECT_EQ(i.known("a.h", Brackets), "no file");
 }
 
@@ -164,7 +166,7 @@ TEST(FileFinder, SeesInTheNextMomentThatAFileIsGone) {
     std::filesystem::remove(i.directory.nameOf("two/a.h"));
     i.beginMoment();
     EXPECT_EQ(i.known("a.h", Brackets), "no file");
-    EXPECT_FALSE(i.finder.enter("a.h", Brackets));
+    EXPECT_EQ(i.finder.enter("a.h", Brackets), Nowhere);
 }
 
 TEST(FileFinder, SeesInTheNextMomentThatAFileCameBefore) {
@@ -173,7 +175,7 @@ TEST(FileFinder, SeesInTheNextMomentThatAFileCameBefore) {
     i.directory.write("one/a.h", "in one\n");
     i.beginMoment();
     EXPECT_EQ(i.known("a.h", Brackets), "no file");
-    EXPECT_TRUE(i.finder.enter("a.h", Brackets));
+    EXPECT_EQ(i.finder.enter("a.h", Brackets), Entered);
     EXPECT_EQ(i.f.sources.position().fileName, i.directory.nameOf("one/a.h"));
 }
 
@@ -211,7 +213,7 @@ struct MissingFixture : FinderFixture {
         : FinderFixture(runOptions) {
         directory.write("two/b.h", "in two\n");
         for (int time = 0; time < 1000; ++time) {
-            EXPECT_TRUE(finder.enter("a.h", Brackets));
+            EXPECT_EQ(finder.enter("a.h", Brackets), Entered);
             EXPECT_TRUE(f.sources.leaveEndedFile() || f.sources.next().kind != NEWLINE);
             while (f.sources.position().fileName != "main") {
                 (void)f.sources.next();
@@ -221,7 +223,8 @@ struct MissingFixture : FinderFixture {
     }
 
     [[nodiscard]] std::string entered(std::string_view name) {
-        return finder.enter(name, Brackets) ? std::string(f.sources.position().fileName) : "none";
+        return finder.enter(name, Brackets) == Entered ? std::string(f.sources.position().fileName)
+                                                       : "none";
     }
 };
 
@@ -245,8 +248,32 @@ TEST(FileFinder, BeginsAMomentWhenItMeetsAFileThatIsYoungerThanTheMoment) {
     constexpr std::int64_t kSecond = 1'000'000'000;
     FinderFixture i({.settlingTime = kSecond});
     const std::size_t before = i.finder.moment();
-    EXPECT_TRUE(i.finder.enter("a.h", Brackets));
+    EXPECT_EQ(i.finder.enter("a.h", Brackets), Entered);
     EXPECT_NE(i.finder.moment(), before);
+}
+
+TEST(FileFinder, LeadsToAFileThatIsAtHandWithoutOpeningIt) {
+    FinderFixture i;
+    const std::string path = i.directory.nameOf("two/a.h");
+    i.enterTwice("a.h", Brackets);
+    EXPECT_TRUE(i.f.sources.leaveEndedFile() || i.f.sources.next().kind != NEWLINE);
+    while (i.f.sources.position().fileName != "main") {
+        (void)i.f.sources.next();
+        (void)i.f.sources.leaveEndedFile();
+    }
+    i.finder.find("a.h", Brackets)->file->bytes = std::make_shared<FileBytes>("in two\n");
+    EXPECT_EQ(i.finder.enter(path, Quotes), Known);
+    EXPECT_EQ(i.f.sources.position().fileName, "main");
+    EXPECT_EQ(i.known(path, Quotes), path);
+    i.directory.write("two/a.h", "something else\n");
+    EXPECT_EQ(i.finder.enter(path, Quotes), Entered);
+}
+
+TEST(FileFinder, OpensAFileThatIsAtHandWhereNoneWasOpenBefore) {
+    FinderFixture i;
+    i.enterTwice("a.h", Brackets);
+    i.finder.find("a.h", Brackets)->file->bytes = std::make_shared<FileBytes>("in two\n");
+    EXPECT_EQ(i.finder.enter(i.directory.nameOf("two/a.h"), Quotes), Entered);
 }
 
 }  // namespace

@@ -175,5 +175,24 @@ TEST(IncludedFiles, KeepsNothingOfAFileThatComesOutEmpty) {
     EXPECT_EQ(i.files.find("a.h", IncludeForm::Brackets)->file->bytes, nullptr);
 }
 
+TEST(IncludedFiles, PassesOverAFileByAnotherOfItsNames) {
+    EmptyFileFixture i;
+    i.files.open(i.name, IncludeForm::Quotes, nullptr);
+    EXPECT_EQ(i.f.written(), i.passed);
+}
+
+TEST(IncludedFiles, ReadsAKeptFileByAnotherOfItsNames) {
+    FilesFixture i;
+    for (int times = 0; times < 2; ++times) {
+        i.open("a.h");
+        i.readFile();
+    }
+    const std::string name = i.directory.nameOf("one/a.h");
+    i.files.open(name, IncludeForm::Quotes, nullptr);
+    EXPECT_TRUE(i.f.sources.currentFile().lacksDescriptor());
+    EXPECT_EQ(i.f.sources.position().fileName, name);
+    EXPECT_EQ(i.f.rest(), "in one\nmain\n");
+}
+
 }  // namespace
 }  // namespace umpre
