@@ -29,21 +29,21 @@ using enum TokenKind;
 // text.
 constexpr std::size_t kDeepest = 16;
 
-constexpr Token kBlank{WHITESPACE, " "};
-
 }  // namespace
 
 void ConditionTokens::read(DirectiveLine& line) {
     line_ = &line;
     replacements_.clear();
-    last_ = kBlank;
+    peeked_ = {};
+    isApart_ = true;
     meets_ = false;
     expected_ = Expected::Anything;
     hasPeek_ = false;
     isTold_ = true;
 }
 
-Token ConditionTokens::scan() {
+// Reads the token behind `peeked_` into its place.
+void ConditionTokens::scan() {
     while (isTold_) {
         const Token token = scanUnexpanded();
         if (token.kind == END_OF_INPUT) {
@@ -52,15 +52,16 @@ Token ConditionTokens::scan() {
         if (!isProtected(token.kind) && isName(token.kind) && beginReplacement(token.text)) {
             continue;
         }
-        if (token.kind == OTHER || (meets_ && mayJoin(last_, token))) {
+        if (token.kind == OTHER || (meets_ && !isApart_ && mayJoin(peeked_, token))) {
             isTold_ = false;
             break;
         }
-        last_ = token;
+        peeked_ = token;
+        isApart_ = false;
         meets_ = false;
-        return token;
+        return;
     }
-    return {};
+    peeked_ = {};
 }
 
 // Returns the next token of the innermost text that has one.
@@ -72,16 +73,14 @@ Token ConditionTokens::scanUnexpanded() {
             meets_ = true;
         } else if (*text.at == ' ') {
             ++text.at;
-            last_ = kBlank;
+            isApart_ = true;
         } else {
             const Token token = tokenAt(text.at);
             text.at += token.text.size();
             return token;
         }
     }
-    if (line_->skipBlanks()) {
-        last_ = kBlank;
-    }
+    isApart_ |= line_->skipBlanks();
     return line_->isAtEnd() ? Token{} : line_->next();
 }
 

@@ -29,13 +29,14 @@ public:
 
     [[nodiscard]] TokenKind peek() {
         if (!hasPeek_) {
-            peeked_ = scan();
+            scan();
             hasPeek_ = true;
         }
         return peeked_.kind;
     }
 
-    Token next() {
+    /// Returns the next token, which is valid until another one is asked for.
+    const Token& next() {
         (void)peek();
         hasPeek_ = false;
         return peeked_;
@@ -63,7 +64,7 @@ private:
     // What the tokens behind `defined` are.
     enum class Expected { Anything, Operand, ParenthesizedOperand };
 
-    [[nodiscard]] Token scan();
+    void scan();
     [[nodiscard]] Token scanUnexpanded();
     [[nodiscard]] bool isProtected(TokenKind kind);
     [[nodiscard]] bool beginReplacement(std::string_view name);
@@ -71,10 +72,10 @@ private:
     MacroTable& macros_;
     DirectiveLine* line_ = nullptr;
     std::vector<Replacement> replacements_;  // the innermost one is the last
-    Token last_;                             // the token before the one that comes next, or a blank
-    bool meets_ = false;                     // a replacement began or ended since
+    Token peeked_;         // comes next if `hasPeek_`, otherwise it was the last one
+    bool isApart_ = true;  // blanks were passed since
+    bool meets_ = false;   // a replacement began or ended since
     Expected expected_ = Expected::Anything;
-    Token peeked_;
     bool hasPeek_ = false;
     bool isTold_ = true;
 };

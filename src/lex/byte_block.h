@@ -8,6 +8,8 @@
 #include <cstdint>
 #include <cstring>
 #include <simde/x86/sse2.h>
+#include <type_traits>
+#include <utility>
 
 namespace umpre {
 
@@ -56,9 +58,7 @@ public:
 
     /// Takes the bytes from `at`.
     explicit BasicByteBlock(const char* at) noexcept {
-        for (std::size_t part = 0; part < kParts; ++part) {
-            parts_[part] = Vector::load(at + part * Vector::kSize);
-        }
+        forEachPart([&](auto part) { parts_[part] = Vector::load(at + part * Vector::kSize); });
     }
 
     /// Takes the bytes from `at` up to `end`; if these are fewer, zero bytes behind them.
@@ -108,6 +108,17 @@ private:
 
     static constexpr std::size_t kParts = kSize / Vector::kSize;
 
+    // No loop: compilers would not unroll it by themselves.
+    template <typename Action, std::size_t... kPart>
+    static void forEach(Action action, std::index_sequence<kPart...> /*parts*/) noexcept {
+        (action(std::integral_constant<std::size_t, kPart>{}), ...);
+    }
+
+    template <typename Action>
+    static void forEachPart(Action action) noexcept {
+        forEach(action, std::make_index_sequence<kParts>{});
+    }
+
     [[nodiscard]] static Part equal(Part part, char byte) noexcept {
         return Vector::equal(part, Vector::all(byte));
     }
@@ -130,9 +141,9 @@ private:
     template <typename Test>
     [[nodiscard]] Mask maskOf(Test test) const noexcept {
         Mask mask = 0;
-        for (std::size_t part = 0; part < kParts; ++part) {
+        forEachPart([&](auto part) {
             mask |= Mask{Vector::bits(test(parts_[part]))} << part * Vector::kSize;
-        }
+        });
         return mask;
     }
 

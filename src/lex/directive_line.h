@@ -43,7 +43,12 @@ public:
     /// Tells whether there were any.
     bool skipBlanks() {
         const char* const begin = at_;
-        at_ = blanksEnd(at_).end;
+        while (*at_ == ' ') {
+            ++at_;
+        }
+        if (*at_ < ' ' || *at_ == '/' || *at_ == '\\') {  // other blanks, perhaps
+            at_ = blanksEnd(at_).end;
+        }
         return at_ != begin;
     }
 
