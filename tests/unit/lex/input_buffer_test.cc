@@ -68,6 +68,12 @@ constexpr auto kTexts = std::to_array<std::string_view>({
     return text;
 }
 
+TEST(InputBuffer, IsEmptyBeforeItIsOpened) {
+    InputBuffer input({});
+    EXPECT_EQ(windowsOf(input), std::vector<std::string>{});
+    EXPECT_EQ(*input.end(), '\0');
+}
+
 TEST(InputBuffer, GivesAllBytesOfAFile) {
     const TemporaryDirectory directory;
     for (const std::string_view text : kTexts) {
