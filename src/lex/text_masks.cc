@@ -1,14 +1,16 @@
 // SPDX-License-Identifier: MIT
 #include "lex/text_masks.h"
 
-#if __has_include(<sys/platform/x86.h>)
+// Not with clang++, which takes the header for C alone.
+#if __has_include(<sys/platform/x86.h>) && !defined(__clang__)
 #include <sys/platform/x86.h>
+#define UMPRE_LEX_LIBRARY_KNOWS_CPU
 #endif
 
 namespace umpre {
 namespace {
 
-#if __has_include(<sys/platform/x86.h>)
+#ifdef UMPRE_LEX_LIBRARY_KNOWS_CPU
 // The C library has asked the processor already. To ask it once more takes long in virtual
 // machines.
 [[nodiscard]] bool hasWideVectors() noexcept {
