@@ -8,8 +8,8 @@
 
 namespace umpre {
 
-// What readers of several bytes at a time may read besides the bytes; the generated scanner wants
-// two of those behind to be zero.
+// What readers of several bytes at a time may read besides the bytes; those before are zero, and
+// the generated scanner wants two of those behind to be, too.
 constexpr std::size_t kBytesBefore = 8;
 constexpr std::size_t kBytesBehind = 64;
 

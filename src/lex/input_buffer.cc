@@ -252,6 +252,7 @@ void InputBuffer::reserve(std::size_t capacity) {
     (void)data_.release();
     data_.reset(static_cast<char*>(memory));
     begin_ = data_.get() + kBytesBefore;
+    std::memset(data_.get(), 0, kBytesBefore);
     capacity_ = capacity;
 }
 
