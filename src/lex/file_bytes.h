@@ -3,8 +3,8 @@
 #define UMPRE_LEX_FILE_BYTES_H
 
 #include <cstddef>
-#include <memory>
 #include <string_view>
+#include <vector>
 
 namespace umpre {
 
@@ -18,18 +18,18 @@ constexpr std::size_t kBytesBehind = 64;
 class FileBytes {
 public:
     explicit FileBytes(std::string_view bytes)
-        : memory_(std::make_unique<char[]>(kBytesBefore + bytes.size() + kBytesBehind)),
-          size_(bytes.size()) {
-        bytes.copy(begin(), size_);
+        : memory_(kBytesBefore + bytes.size() + kBytesBehind) {
+        bytes.copy(begin(), bytes.size());
     }
 
-    [[nodiscard]] char* begin() const noexcept { return memory_.get() + kBytesBefore; }
+    [[nodiscard]] char* begin() noexcept { return memory_.data() + kBytesBefore; }
 
-    [[nodiscard]] std::size_t size() const noexcept { return size_; }
+    [[nodiscard]] std::size_t size() const noexcept {
+        return memory_.size() - kBytesBefore - kBytesBehind;
+    }
 
 private:
-    std::unique_ptr<char[]> memory_;  // NOLINT(modernize-avoid-c-arrays): its size never changes
-    std::size_t size_;
+    std::vector<char> memory_;
 };
 
 }  // namespace umpre

@@ -74,7 +74,7 @@ void OutputWriter::writeLineMarker(const SourcePosition& position) {
 void OutputWriter::writeLineMarker(std::int32_t line, const Snippet& markerEnd) {
     outputLine_ = line;
     if (kMarkerSize + Snippet::kRoom > kBlockSize - used_) {
-        std::array<char, kMarkerSize + Snippet::kRoom> marker;
+        std::array<char, kMarkerSize + Snippet::kRoom> marker{};
         const char* const end = put(putMarkerBegin(marker.data(), line), markerEnd.text());
         write({marker.data(), static_cast<std::size_t>(end - marker.data())});
         return;

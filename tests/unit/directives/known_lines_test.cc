@@ -17,7 +17,9 @@ public:
         memory_.append(ByteBlock::kSize, '\n');
     }
 
-    operator std::string_view() const { return {memory_.data(), size_}; }  // NOLINT: as a file's is
+    operator std::string_view() const {
+        return {memory_.data(), size_};
+    }  // NOLINT(google-explicit-constructor): a text in place of a view
 
 private:
     std::string memory_;
