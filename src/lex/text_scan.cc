@@ -258,7 +258,9 @@ ByteBlock::Mask TextScan::namesIn(const Block& block) const noexcept {
     while (starts != 0) {
         const unsigned start = firstBit(starts);
         const std::string_view name(block.at + start, firstBit(ends) - start);
-        found |= static_cast<Mask>(names_.mayHoldAmongBytes(name)) << start;
+        if (names_.mayHoldAmongBytes(name)) {
+            return found | Mask{1} << start;
+        }
         starts &= starts - 1;
         ends &= ends - 1;
     }
