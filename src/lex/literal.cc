@@ -1,6 +1,9 @@
 // SPDX-License-Identifier: MIT
 #include "lex/literal.h"
 
+#include <algorithm>
+#include <cstddef>
+
 #include "lex/byte_block.h"
 #include "lex/spelling.h"
 
@@ -14,25 +17,27 @@ LiteralScan scanLiteral(const char* at, const char* end) noexcept {
         return {Result::Open, at};
     }
     while (at < end) {
-        const ByteBlock::Mask stops = ByteBlock::between(at, end).any(quote, '\\', '\n');
-        if (stops == 0) {
-            at += ByteBlock::kSize;
-            continue;
+        const char* const block = at;
+        ByteBlock::Mask stops = ByteBlock::between(block, end).any(quote, '\\', '\n');
+        at += ByteBlock::kSize;
+        while (stops != 0) {
+            const char* const stop = block + firstBit(stops);
+            if (*stop == quote) {
+                return {Result::Closed, stop + 1};
+            }
+            if (*stop == '\n') {
+                return {Result::Open, stop};
+            }
+            if (stop + 1 >= end) {
+                return {Result::Cut, stop};
+            }
+            if (isLineEndByte(stop[1])) {
+                return {Result::Open, stop};
+            }
+            const char* const behind = stop + 2;
+            at = std::max(at, behind);
+            stops &= ~bitsBelow(static_cast<std::size_t>(behind - block));
         }
-        at += firstBit(stops);
-        if (*at == quote) {
-            return {Result::Closed, at + 1};
-        }
-        if (*at == '\n') {
-            return {Result::Open, at};
-        }
-        if (at + 1 >= end) {
-            return {Result::Cut, at};
-        }
-        if (isLineEndByte(at[1])) {
-            return {Result::Open, at};
-        }
-        at += 2;
     }
     return {Result::Cut, end};
 }
