@@ -53,7 +53,7 @@ public:
             case Byte::Name: at = passName(at, argument); break;
             case Byte::Blank: {
                 const char* const behind = passBlanks(at, depth);
-                if (behind != nullptr && endsArgument(behind, depth)) {
+                if (behind != nullptr && behind < end_ && endsArgument(behind, depth)) {
                     argument.raw = {begin, static_cast<std::size_t>(at - begin)};
                     return behind;
                 }

@@ -17,7 +17,8 @@ namespace {
     names.add("N");
     CallOutline outline;
     std::vector<ArgumentText> arguments;
-    const std::string padded = std::string(text) + "        ";
+    // What is behind the end is not to be taken for the end of an argument.
+    const std::string padded = std::string(text) + ")       ";
     const char* const end = padded.data() + text.size();
     const char* const behind =
         takeArgumentTexts(padded.data(), end, count, names, outline, arguments);
@@ -60,10 +61,10 @@ TEST(ArgumentTexts, AreFound) {
 
 TEST(ArgumentTexts, AreLeftIfBytesDoNotTell) {
     for (const std::string_view text :
-         {"(",         "(a",        "(a,",      "(a, b",      "(a, (b)",     "()",
-          "(a)",       "(a,)",      "(,)",      "(a, b, c)",  "(a, b,)x,",   "(a  b, c)",
-          "(a\tb, c)", "(a\nb, c)", "(\na, c)", "(a, b\n)",   "(a /**/, b)", "(a, b//)",
-          "(a, \")",   "(a, ')",    "(a, '')",  "(a, b\\\n)", "(a, \r)"}) {
+         {"(",         "(a, b ",    "(a",        "(a,",      "(a, b",      "(a, (b)",
+          "()",        "(a)",       "(a,)",      "(,)",      "(a, b, c)",  "(a, b,)x,",
+          "(a  b, c)", "(a\tb, c)", "(a\nb, c)", "(\na, c)", "(a, b\n)",   "(a /**/, b)",
+          "(a, b//)",  "(a, \")",   "(a, ')",    "(a, '')",  "(a, b\\\n)", "(a, \r)"}) {
         EXPECT_EQ(argumentsOf(text, 2), text == "(a, b,)x," ? "[a][b]x," : "(not told)") << text;
     }
 }
