@@ -38,11 +38,15 @@ def counts(build):
     branches = collections.defaultdict(collections.Counter)
     notes = sorted(str(path) for path in build.rglob("*.gcno"))
     with tempfile.TemporaryDirectory() as scratch:
-        listing = subprocess.run(
+        done = subprocess.run(
             ["gcov", "--branch-probabilities", "--json-format", "--stdout", *notes],
-            cwd=scratch, check=True, stdout=subprocess.PIPE, stderr=subprocess.DEVNULL,
-        ).stdout
-    for document in listing.splitlines():
+            cwd=scratch, check=False, capture_output=True,
+        )
+    if done.returncode != 0:
+        # As after a build that the tests were not run with, or where a source was moved.
+        said = done.stderr.decode(errors="replace").splitlines()
+        sys.exit("gcov: " + next((line for line in said if "mismatch" in line), said[-1]))
+    for document in done.stdout.splitlines():
         data = json.loads(document)
         for file in data["files"]:
             path = pathlib.Path(data["current_working_directory"], file["file"]).resolve()
