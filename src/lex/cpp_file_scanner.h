@@ -70,7 +70,7 @@ public:
     /// Tells whether "#" comes next, and is no "##".
     [[nodiscard]] bool isAtHash() {
         const std::string_view bytes = bytesAhead();
-        return !bytes.empty() && bytes[0] == '#' && bytes.data()[1] != '#';
+        return bytes.starts_with('#') && !bytes.starts_with("##");
     }
 
     /// Returns the whole lines among the bytes ahead; at the end of the file, all of them.

@@ -133,24 +133,19 @@ const char* takeArgumentTexts(const char* open, const char* end, std::size_t cou
                               const NameFilter& macroNames, CallOutline& outline,
                               std::vector<ArgumentText>& arguments) {
     Reader reader(end, macroNames, outline);
-    const char* at = open + 1;
-    for (std::size_t taken = 0;; ++taken) {
-        at = skipBlanks(at, end);
-        if (at < end && *at == ')') {
-            return taken == count ? at + 1 : nullptr;
-        }
-        if (at == end || taken == count) {
-            return nullptr;
-        }
+    const char* at = skipBlanks(open + 1, end);
+    std::size_t taken = 0;
+    while (at < end && *at != ')' && taken < count) {
         at = reader.read(at, arguments.emplace_back());
+        ++taken;
         if (at == nullptr) {
             return nullptr;
         }
-        if (*at == ')') {
-            return taken + 1 == count ? at + 1 : nullptr;
+        if (*at == ',') {
+            at = skipBlanks(at + 1, end);
         }
-        ++at;
     }
+    return at < end && *at == ')' && taken == count ? at + 1 : nullptr;
 }
 
 }  // namespace umpre

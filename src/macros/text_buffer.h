@@ -73,7 +73,7 @@ public:
     /// Returns the text. A zero byte follows it.
     [[nodiscard]] std::string_view view() noexcept {
         if (empty()) {
-            return {"", 0};
+            return "";
         }
         bytes_[size()] = '\0';
         return {bytes_.data(), size()};
