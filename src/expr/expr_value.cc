@@ -92,7 +92,7 @@ constexpr std::uint32_t kShiftMask = 31;  // counts are taken modulo 32
 
 constexpr std::array<std::int8_t, 512> kPrecedences = [] {
     std::array<std::int8_t, 512> precedences{};
-    for (std::size_t kind = 0; kind < precedences.size(); ++kind) {
+    for (std::size_t kind = 0; kind != precedences.size(); ++kind) {
         precedences[kind] = static_cast<std::int8_t>(precedence(static_cast<TokenKind>(kind)));
     }
     return precedences;

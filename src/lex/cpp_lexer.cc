@@ -43,6 +43,7 @@ constexpr std::array<Beginning, 256> kBeginnings = [] {
 
 }  // namespace
 
+// cppcheck-suppress uninitMemberVar ; the text map says itself what it knows
 CppLexer::CppLexer(CommentSink& commentSink, const RunOptions& options)
     : commentSink_(commentSink), plainRoad_(options.plainRoad) {
     // As after the first call of the generated half, which would go back to the buffer's beginning.

@@ -27,7 +27,7 @@ inline constexpr std::array<TextByte, 256> kTextBytes = [] {
     for (const char byte : std::string_view("\n\r\0\\/\"'", 7)) {
         bytes[static_cast<unsigned char>(byte)] = TextByte::Unusual;
     }
-    for (std::size_t at = 0; at < bytes.size(); ++at) {
+    for (std::size_t at = 0; at != bytes.size(); ++at) {
         const char byte = static_cast<char>(at);
         if (isWordByte(byte)) {
             bytes[at] = isDigit(byte) ? TextByte::Digit : TextByte::Name;

@@ -38,7 +38,7 @@ namespace umpre {
 
 inline constexpr std::array<bool, 256> kIsWordByte = [] {
     std::array<bool, 256> isWord{};
-    for (std::size_t byte = 0; byte < isWord.size(); ++byte) {
+    for (std::size_t byte = 0; byte != isWord.size(); ++byte) {
         isWord[byte] = isWordByte(static_cast<char>(byte));
     }
     return isWord;
