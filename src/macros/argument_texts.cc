@@ -15,7 +15,7 @@ enum class Byte : unsigned char { Passed, Name, Number, Blank, Delimiter, Unusua
 
 constexpr std::array<Byte, 256> kBytes = [] {
     std::array<Byte, 256> bytes{};
-    for (std::size_t at = 0; at < bytes.size(); ++at) {
+    for (std::size_t at = 0; at != bytes.size(); ++at) {
         const char byte = static_cast<char>(at);
         switch (textByte(byte)) {
         case TextByte::Plain: bytes[at] = isBlankByte(byte) ? Byte::Blank : Byte::Passed; break;
