@@ -48,7 +48,7 @@ private:
     [[nodiscard]] Outcome passCarriageReturn();
     [[nodiscard]] Outcome passHash();
     [[nodiscard]] bool passDirective(TokenKind word, const char* behind);
-    [[nodiscard]] bool passLineOf(const char* word);
+    [[nodiscard]] bool passLineOf(const char* behind);
 
     [[nodiscard]] Stop stopHere() const noexcept {
         return lineStart_.before(at_) != nullptr ? Stop::LineStart : Stop::InLine;

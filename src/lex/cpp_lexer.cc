@@ -190,10 +190,7 @@ TokenKind CppLexer::blockComment() {
         lineEnds += scan.lineFeeds;
         if (scan.stop == Stop::CarriageReturn) {
             ++lineEnds;
-            if (at + 1 == end_) {
-                (void)readOn(at, Need::Bytes);
-            }
-            at += at[1] == '\n' ? 2 : 1;
+            at = behindCarriageReturn(at);
         }
     } while (scan.stop == Stop::CarriageReturn || (scan.stop == Stop::Cut && goesOn()));
     moveTo(scan.stop == Stop::Closed ? at : end_);
@@ -203,6 +200,14 @@ TokenKind CppLexer::blockComment() {
         commentSink_.unterminatedComment(line_);
     }
     return TokenKind::WHITESPACE;
+}
+
+// Returns where a line end ends that begins with a carriage return.
+char* CppLexer::behindCarriageReturn(char* at) {
+    if (at + 1 == end_) {
+        (void)readOn(at, Need::Bytes);
+    }
+    return at + (at[1] == '\n' ? 2 : 1);
 }
 
 // Counts the line ends that were read in a comment, and begins a new count. Returns false if nobody

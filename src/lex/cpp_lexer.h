@@ -69,6 +69,7 @@ private:
     [[nodiscard]] TokenKind lineEnd();
     [[nodiscard]] TokenKind continuation();
     [[nodiscard]] TokenKind blockComment();
+    [[nodiscard]] char* behindCarriageReturn(char* at);
     [[nodiscard]] bool passOnLineEnds(std::size_t& count);
     [[nodiscard]] TokenKind lineComment();
 

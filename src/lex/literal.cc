@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <cstddef>
+#include <optional>
 
 #include "lex/byte_block.h"
 #include "lex/spelling.h"
@@ -10,6 +11,29 @@
 namespace umpre {
 
 using Result = LiteralScan::Result;
+
+namespace {
+
+// Tells what a quote, a line feed or a backslash in a literal ends; nothing if the literal goes on
+// behind the backslash and what follows it.
+[[nodiscard]] std::optional<LiteralScan> scanEndingAt(const char* stop, char quote,
+                                                      const char* end) noexcept {
+    if (*stop == quote) {
+        return LiteralScan{Result::Closed, stop + 1};
+    }
+    if (*stop == '\n') {
+        return LiteralScan{Result::Open, stop};
+    }
+    if (stop + 1 >= end) {
+        return LiteralScan{Result::Cut, stop};
+    }
+    if (isLineEndByte(stop[1])) {
+        return LiteralScan{Result::Open, stop};
+    }
+    return std::nullopt;
+}
+
+}  // namespace
 
 LiteralScan scanLiteral(const char* at, const char* end) noexcept {
     const char quote = *at++;
@@ -22,17 +46,8 @@ LiteralScan scanLiteral(const char* at, const char* end) noexcept {
         at += ByteBlock::kSize;
         while (stops != 0) {
             const char* const stop = block + firstBit(stops);
-            if (*stop == quote) {
-                return {Result::Closed, stop + 1};
-            }
-            if (*stop == '\n') {
-                return {Result::Open, stop};
-            }
-            if (stop + 1 >= end) {
-                return {Result::Cut, stop};
-            }
-            if (isLineEndByte(stop[1])) {
-                return {Result::Open, stop};
+            if (const std::optional<LiteralScan> scan = scanEndingAt(stop, quote, end)) {
+                return *scan;
             }
             const char* const behind = stop + 2;
             at = std::max(at, behind);

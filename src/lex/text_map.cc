@@ -54,11 +54,10 @@ const char* TextMap::findSpecial(const char* from, const char* end) {
             const unsigned place = firstBit(found);
             const auto inString =
                 static_cast<unsigned>(std::countl_one(strings << (ByteBlock::kSize - 1 - place)));
-            if (inString == 0) {
-                return block + place;
-            }
             const bool opensBefore = inString == place + 1 && carried != 0;
-            return opensBefore ? openQuote(masks, open) : block + (place + 1 - inString);
+            // If it is in a string, at that one's quote.
+            return opensBefore ? openQuote(masks, open)
+                               : block + (place - std::max(inString, 1U) + 1);
         }
         if (carried != 0) {
             open = openQuote(masks, open);

@@ -126,7 +126,7 @@ private:
     std::size_t size_ = 0;
     BytesBefore before_;     // what follows
     std::size_t known_ = 0;  // blocks
-    TextMasks behind_;       // of the block that follows, if there is one
+    TextMasks behind_{};     // of the block that follows, if there is one
     // Behind those of the bytes stand masks that end every search.
     std::vector<TextMasks> masks_;
 };

@@ -71,34 +71,33 @@ namespace {
 }  // namespace
 
 TextMark TextScan::next() {
-    for (;;) {
-        if (at_ >= end_) {
-            if (openQuote_ == nullptr) {
-                return TextMark::End;
-            }
-            if (!returnToQuote()) {
-                return TextMark::Literal;
-            }
-            continue;
+    TextMark mark = TextMark::End;
+    do {
+        if (at_ < end_) {
+            mark = scanBlock();
+        } else if (openQuote_ == nullptr) {
+            return TextMark::End;
+        } else if (!returnToQuote()) {
+            return TextMark::Literal;
         }
-        Block block = blockAt(at_);
-        if (block.size == 0) {
-            if (passLongWord()) {
-                return TextMark::Name;
-            }
-            continue;
-        }
-        if (block.unusual != 0) {
-            passUnusual(block);
-        }
-        findNames(block);
-        lineFeeds_ += countBits(block.lineFeeds & bitsBelow(block.stop));
-        at_ = block.next;
-        openQuote_ = block.openQuote;
-        if (block.mark != TextMark::End) {
-            return block.mark;
-        }
+    } while (mark == TextMark::End);
+    return mark;
+}
+
+// Goes on over up to 64 bytes. Returns End if no mark was found in them.
+TextMark TextScan::scanBlock() {
+    Block block = blockAt(at_);
+    if (block.size == 0) {
+        return passLongWord() ? TextMark::Name : TextMark::End;
     }
+    if (block.unusual != 0) {
+        passUnusual(block);
+    }
+    findNames(block);
+    lineFeeds_ += countBits(block.lineFeeds & bitsBelow(block.stop));
+    at_ = block.next;
+    openQuote_ = block.openQuote;
+    return block.mark;
 }
 
 TextScan::Block TextScan::blockAt(const char* at) {

@@ -76,6 +76,7 @@ private:
     using Mask = ByteBlock::Mask;
     struct Block;
 
+    [[nodiscard]] TextMark scanBlock();
     [[nodiscard]] Block blockAt(const char* at);
     void passUnusual(Block& block);
     void passAt(Block& block, const char* place);

@@ -79,7 +79,7 @@ struct Expansion {
 struct alignas(64) MacroName : Name {
     mutable Expansion expansion;
     /// The bytes of a name that they suffice for.
-    std::array<char, 64> shortName;
+    std::array<char, 64> shortName{};
     Macro macro;
 };
 
