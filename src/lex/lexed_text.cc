@@ -2,42 +2,12 @@
 #include "lex/lexed_text.h"
 
 #include <algorithm>
-#include <array>
 #include <cassert>
 #include <cstring>
 
 #include "lex/token_join.h"
 
 namespace umpre {
-namespace {
-
-// Bytes of one group may go on with each other in a token; a token that begins with a byte of the
-// last group must be looked at by itself.
-constexpr std::uint8_t kWord = 1;
-constexpr std::uint8_t kPunctuator = 2;
-constexpr std::uint8_t kBlank = 4;
-constexpr std::uint8_t kAlone = 8;
-
-constexpr std::array<std::uint8_t, 256> kGroups = [] {
-    std::array<std::uint8_t, 256> groups{};
-    const auto add = [&groups](std::string_view bytes, std::uint8_t group) {
-        for (const char byte : bytes) {
-            groups[static_cast<unsigned char>(byte)] |= group;
-        }
-    };
-    add("ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz_0123456789", kWord);
-    add("/*<>=&|#!", kPunctuator);
-    add(" \t\v\f\n\r", kBlank);
-    add("\t\v\f\n\r\\\"'", kAlone);
-    return groups;
-}();
-
-[[nodiscard]] std::uint8_t groupsOf(char byte) noexcept {
-    return kGroups[static_cast<unsigned char>(byte)];
-}
-
-}  // namespace
-
 void LexedText::clear() {
     text_.clear();
     tokens_.clear();
@@ -84,8 +54,9 @@ void LexedText::copyText(const char* from, std::size_t size) {
 // Most tokens are known to be clean by the bytes on the two sides of where they begin.
 void LexedText::markUnclean(std::size_t index) {
     const std::size_t begin = beginOf(index);
-    const unsigned before = begin == 0 ? kAlone : groupsOf(text_[begin - 1]) | kAlone;
-    const unsigned after = begin == text_.size() ? kAlone : groupsOf(text_[begin]);
+    const unsigned before =
+        begin == 0 ? JoinGroup::kAlone : joinGroupsOf(text_[begin - 1]) | JoinGroup::kAlone;
+    const unsigned after = begin == text_.size() ? JoinGroup::kAlone : joinGroupsOf(text_[begin]);
     const bool isUnclean = (before & after) != 0 && isFoundUnclean(index);
     tokens_[index].set(Entry::kUnclean, isUnclean);
 }
