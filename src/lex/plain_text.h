@@ -18,8 +18,8 @@ namespace umpre {
 enum class TextByte : unsigned char {
     Plain,    ///< a token by itself, or part of one that needs no look at the others
     Unusual,  ///< quotes, slashes, backslashes, line ends, zero bytes
-    Digit,    ///< begins a number, or goes on with a word
-    Name,     ///< begins a name, or goes on with a word
+    Digit,    ///< begins a number
+    Name,     ///< begins a name
 };
 
 inline constexpr std::array<TextByte, 256> kTextBytes = [] {
@@ -38,14 +38,6 @@ inline constexpr std::array<TextByte, 256> kTextBytes = [] {
 
 [[nodiscard]] constexpr TextByte textByte(char byte) noexcept {
     return kTextBytes[static_cast<unsigned char>(byte)];
-}
-
-/// Returns the end of a name that begins at `at`.
-[[nodiscard]] inline const char* plainNameEnd(const char* at) noexcept {
-    do {
-        ++at;
-    } while (textByte(*at) >= TextByte::Digit);
-    return at;
 }
 
 }  // namespace umpre

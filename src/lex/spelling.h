@@ -44,6 +44,14 @@ inline constexpr std::array<bool, 256> kIsWordByte = [] {
     return isWord;
 }();
 
+/// Returns the first byte from `at` on that is no blank, or `end`.
+[[nodiscard]] inline const char* skipBlankBytes(const char* at, const char* end) noexcept {
+    while (at < end && isBlankByte(*at)) {
+        ++at;
+    }
+    return at;
+}
+
 /// Returns the end of a name that begins at `at`, or of the rest of one.
 [[nodiscard]] inline const char* nameEnd(const char* at) noexcept {
     while (kIsWordByte[static_cast<unsigned char>(*at)]) {

@@ -30,13 +30,6 @@ constexpr std::array<Byte, 256> kBytes = [] {
     return bytes;
 }();
 
-[[nodiscard]] const char* skipBlanks(const char* at, const char* end) noexcept {
-    while (at < end && isBlankByte(*at)) {
-        ++at;
-    }
-    return at;
-}
-
 class Reader {
 public:
     Reader(const char* end, const NameFilter& macroNames, CallOutline& outline)
@@ -76,7 +69,7 @@ public:
 
 private:
     [[nodiscard]] const char* passName(const char* at, ArgumentText& argument) const {
-        const char* const behind = plainNameEnd(at);
+        const char* const behind = nameEnd(at);
         const std::string_view name(at, static_cast<std::size_t>(behind - at));
         argument.mayHaveMacros = argument.mayHaveMacros || macroNames_.mayHoldAmongBytes(name);
         return behind;
@@ -84,27 +77,25 @@ private:
 
     [[nodiscard]] const char* passDelimiter(const char* at, std::size_t& depth,
                                             ArgumentText& argument) {
+        const char* const close = *at == '(' && !makesOutline_ ? outline_.closing(at) : nullptr;
+        if (close != nullptr) {
+            argument.mayHaveMacros = true;
+            return close + 1;
+        }
         if (*at == '(') {
-            const char* const close = makesOutline_ ? nullptr : outline_.closing(at);
-            if (close != nullptr) {
-                argument.mayHaveMacros = true;
-                return close + 1;
-            }
             ++depth;
         } else if (*at == ')') {
             --depth;
         }
-        if (makesOutline_ && *at == '(') {
-            outline_.noteOpen(at);
-        } else if (makesOutline_ && *at == ')') {
-            outline_.noteClosed(at);
+        if (makesOutline_) {
+            outline_.note(at);
         }
         return at + 1;
     }
 
     // Returns where blanks end, or null if they are neither one space nor at the argument's end.
     [[nodiscard]] const char* passBlanks(const char* at, std::size_t depth) const {
-        const char* const behind = skipBlanks(at, end_);
+        const char* const behind = skipBlankBytes(at, end_);
         const bool isSpace = *at == ' ' && behind == at + 1;
         return isSpace || (behind < end_ && endsArgument(behind, depth)) ? behind : nullptr;
     }
@@ -121,6 +112,16 @@ private:
 
 }  // namespace
 
+void CallOutline::note(const char* at) {
+    if (*at == '(') {
+        open_.push_back(parentheses_.size());
+        parentheses_.push_back({at, nullptr});
+    } else if (*at == ')') {
+        parentheses_[open_.back()].close = at;
+        open_.pop_back();
+    }
+}
+
 const char* CallOutline::closing(const char* open) const {
     const auto standsBefore = [](const Parenthesis& one, const char* at) {
         return std::less<>()(one.open, at);
@@ -133,7 +134,7 @@ const char* takeArgumentTexts(const char* open, const char* end, std::size_t cou
                               const NameFilter& macroNames, CallOutline& outline,
                               std::vector<ArgumentText>& arguments) {
     Reader reader(end, macroNames, outline);
-    const char* at = skipBlanks(open + 1, end);
+    const char* at = skipBlankBytes(open + 1, end);
     std::size_t taken = 0;
     while (at < end && *at != ')' && taken < count) {
         at = reader.read(at, arguments.emplace_back());
@@ -142,7 +143,7 @@ const char* takeArgumentTexts(const char* open, const char* end, std::size_t cou
             return nullptr;
         }
         if (*at == ',') {
-            at = skipBlanks(at + 1, end);
+            at = skipBlankBytes(at + 1, end);
         }
     }
     return at < end && *at == ')' && taken == count ? at + 1 : nullptr;

@@ -3,6 +3,7 @@
 #define UMPRE_MACROS_ARGUMENT_TEXTS_H
 
 #include <cstddef>
+#include <optional>
 #include <string_view>
 #include <utility>
 #include <vector>
@@ -15,11 +16,10 @@ namespace umpre {
 struct ArgumentText {
     /// As written, with one space between two tokens and none at the ends.
     std::string_view raw;
-    /// All that it comes out as, once it is worked out.
-    std::string_view expansion{};
-    bool isExpanded = false;
     bool mayHaveMacros = false;  ///< in `raw`
-    bool hasMacros = false;      ///< names of macros were left in the expansion
+    /// All that it comes out as, once it is worked out.
+    std::optional<std::string_view> expansion;
+    bool hasMacros = false;  ///< names of macros were left in the expansion
 };
 
 /// Where the parentheses in the arguments of a call close, so that a call in them is passed over
@@ -35,16 +35,8 @@ public:
     /// Returns true once.
     [[nodiscard]] bool begin() noexcept { return !std::exchange(isBegun_, true); }
 
-    /// Notes a "(" or ")" that stands behind those noted before.
-    void noteOpen(const char* at) {
-        open_.push_back(parentheses_.size());
-        parentheses_.push_back({at, nullptr});
-    }
-
-    void noteClosed(const char* at) {
-        parentheses_[open_.back()].close = at;
-        open_.pop_back();
-    }
+    /// Notes what stands behind all that was noted before, if it is a "(" or ")".
+    void note(const char* at);
 
     /// Returns the ")" of a "(", or null if that is not known.
     [[nodiscard]] const char* closing(const char* open) const;

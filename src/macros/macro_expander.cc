@@ -1,5 +1,8 @@
 // SPDX-License-Identifier: MIT
 //
+// What bytes tell of a name in a file's text is read as bytes (`readName`). All else comes as
+// tokens.
+//
 // A name that is an object-like macro is simple: its body is pushed, with the set of names that
 // must not be expanded in it. A function-like one is an invocation, which may have to expand
 // arguments first, and these may hold invocations. Nothing here calls itself for that:
@@ -16,7 +19,6 @@
 
 #include <utility>
 
-#include "lex/spelling.h"
 #include "macros/argument_slices.h"
 #include "macros/predefined_macros.h"
 
@@ -31,23 +33,12 @@ NameReader::Outcome MacroExpander::readName(std::string_view name, const char* e
         return {name, behind};
     }
     if (macro->macro.functionLike()) {
-        return readCall(*macro, behind, end);
+        call_.clear();
+        const char* const callEnd = texts_.expandCall(*macro, behind, end, call_);
+        return {call_.view(), callEnd};
     }
     const std::optional<std::string_view> text = memo_.textOf(*macro);
     return text ? NameReader::Outcome{*text, behind} : NameReader::Outcome{{}, nullptr};
-}
-
-NameReader::Outcome MacroExpander::readCall(const MacroName& name, const char* behind,
-                                            const char* end) {
-    while (behind < end && isBlankByte(*behind)) {
-        ++behind;
-    }
-    if (behind == end || *behind != '(') {
-        return {{}, nullptr};
-    }
-    call_.clear();
-    const char* const callEnd = texts_.expandCall(name, behind, end, call_);
-    return {call_.view(), callEnd};
 }
 
 std::string_view MacroExpander::expandName(const Token& token) {

@@ -74,8 +74,6 @@ private:
     };
 
     [[nodiscard]] MacroName* entryOf(const Token& token);
-    [[nodiscard]] NameReader::Outcome readCall(const MacroName& name, const char* behind,
-                                               const char* end);
     [[nodiscard]] Outcome lookAt(MacroName* name);
     void refresh(MacroName& name);
     [[nodiscard]] Outcome replaceObject(const MacroName& name);

@@ -22,7 +22,6 @@
 
 #include <algorithm>
 
-#include "lex/literal.h"
 #include "lex/plain_text.h"
 #include "lex/token_join.h"
 #include "macros/argument_texts.h"
@@ -45,33 +44,30 @@ const std::vector<TextBuffer::Part> kNoParts;
 
 }  // namespace
 
-void TextExpander::begin(bool watches) noexcept {
-    watches_ = watches;
+bool TextExpander::expandObject(const MacroName& name, TextBuffer& to) {
+    watches_ = true;
+    macros_.watch(name.text);
+    // The text around ends with the name.
+    const char* const behind = name.text.data() + name.text.size();
+    return expand(name, behind, behind, to) != nullptr;
+}
+
+const char* TextExpander::expandCall(const MacroName& name, const char* behind, const char* end,
+                                     TextBuffer& to) {
+    watches_ = false;
+    return expand(name, behind, end, to);
+}
+
+const char* TextExpander::expand(const MacroName& name, const char* behind, const char* end,
+                                 TextBuffer& to) {
     depth_ = 0;
     work_ = 0;
     around_.clear();
     arguments_.clear();
     outline_.clear();
     buffersUsed_ = 0;
-}
-
-bool TextExpander::expandObject(const MacroName& name, TextBuffer& to) {
-    begin(true);
-    macros_.watch(name.text);
     Result result{to, true};
-    // The text around ends with the name.
-    const char* const behind = name.text.data() + name.text.size();
-    return replace(name, behind, behind, Place::Replacement, result) != nullptr;
-}
-
-const char* TextExpander::expandCall(const MacroName& name, const char* open, const char* end,
-                                     TextBuffer& to) {
-    if (isRefreshed(name)) {
-        return nullptr;
-    }
-    begin(false);
-    Result result{to, true};
-    return replaceCall(name, open, end, Place::Replacement, result);
+    return replace(name, behind, end, Place::Replacement, result);
 }
 
 // Reads a text, but for the parts that are settled, and adds what it comes out as. As everything
@@ -118,7 +114,7 @@ bool TextExpander::readUpTo(const char* end, Reading& reading, Result& result) {
 }
 
 bool TextExpander::readName(Reading& reading, Result& result) {
-    const char* const behind = plainNameEnd(reading.at);
+    const char* const behind = nameEnd(reading.at);
     const MacroName* const name = macroOf(viewOf(reading.at, behind));
     if (name == nullptr) {
         reading.at = behind;
@@ -167,10 +163,8 @@ const char* TextExpander::replace(const MacroName& name, const char* behind, con
         around_.pop_back();
         return isTold ? behind : nullptr;
     }
-    while (behind < end && isBlankByte(*behind)) {
-        ++behind;
-    }
-    return behind < end && *behind == '(' ? replaceCall(name, behind, end, place, result) : nullptr;
+    const char* const open = skipBlankBytes(behind, end);
+    return open < end && *open == '(' ? replaceCall(name, open, end, place, result) : nullptr;
 }
 
 const char* TextExpander::replaceCall(const MacroName& name, const char* open, const char* end,
@@ -179,13 +173,13 @@ const char* TextExpander::replaceCall(const MacroName& name, const char* open, c
     const std::size_t buffersBefore = buffersUsed_;
     const char* const behind = takeArgumentTexts(open, end, name.macro.parameterCount(),
                                                  macros_.filter(), outline_, arguments_);
-    const MacroBody& body = bodies_.bodyOf(name.macro);
-    if (behind == nullptr || !body.isPlain) {
+    if (behind == nullptr) {
         return nullptr;
     }
     work_ += static_cast<std::size_t>(behind - open);
+    const MacroBody& body = bodies_.bodyOf(name.macro);
     Result replacement{takeBuffer()};
-    if (!substitute(body, argumentsBefore, replacement)) {
+    if (!body.isPlain || !substitute(body, argumentsBefore, replacement)) {
         return nullptr;
     }
     TextBuffer& text = replacement.text;
@@ -225,22 +219,18 @@ bool TextExpander::substitute(const MacroBody& body, std::size_t firstArgument, 
 
 bool TextExpander::addArgument(std::size_t index, Result& result) {
     if (!arguments_[index].mayHaveMacros && !watches_) {
-        work_ += arguments_[index].raw.size();
-        return work_ <= kMostWork && addPart(arguments_[index].raw, true, result);
+        return addPart(arguments_[index].raw, true, result);
     }
-    if (!arguments_[index].isExpanded) {
+    if (!arguments_[index].expansion) {
         Result expansion{takeBuffer()};
         if (!read(arguments_[index].raw, kNoParts, Place::Argument, expansion)) {
             return false;
         }
-        ArgumentText& argument = arguments_[index];
-        argument.expansion = expansion.text.view();
-        argument.hasMacros = expansion.hasMacros;
-        argument.isExpanded = true;
+        arguments_[index].expansion = expansion.text.view();
+        arguments_[index].hasMacros = expansion.hasMacros;
     }
     const ArgumentText& argument = arguments_[index];
-    work_ += argument.expansion.size();
-    return work_ <= kMostWork && addPart(argument.expansion, !argument.hasMacros, result);
+    return addPart(*argument.expansion, !argument.hasMacros, result);
 }
 
 bool TextExpander::addJoined(const MacroBody& body, const BodyStep& step, std::size_t firstArgument,
@@ -258,10 +248,8 @@ bool TextExpander::addJoined(const MacroBody& body, const BodyStep& step, std::s
             joined.append(literal_);
         }
     }
-    work_ += joined.view().size();
     bool hasMacros = false;
-    return work_ <= kMostWork && isPlain(joined.view(), hasMacros)
-           && addPart(joined.view(), !hasMacros, result);
+    return isPlain(joined.view(), hasMacros) && addPart(joined.view(), !hasMacros, result);
 }
 
 // Tells whether a joined text yields tokens of text only, and notes whether there are names of
@@ -271,7 +259,7 @@ bool TextExpander::isPlain(std::string_view text, bool& hasMacros) {
     const char* at = text.data();
     while (at != nullptr && at < end) {
         if (isNameStart(*at)) {
-            const char* const behind = plainNameEnd(at);
+            const char* const behind = nameEnd(at);
             hasMacros = hasMacros || macroOf(viewOf(at, behind)) != nullptr;
             at = behind;
         } else {
@@ -296,7 +284,8 @@ bool TextExpander::add(std::string_view text, Result& result) {
 // The same for a part of a replacement, which may be settled.
 bool TextExpander::addPart(std::string_view text, bool isSettled, Result& result) {
     const std::size_t begin = result.text.size();
-    if (!add(text, result)) {
+    work_ += text.size();
+    if (work_ > kMostWork || !add(text, result)) {
         return false;
     }
     if (isSettled) {

@@ -28,10 +28,10 @@ public:
     /// spoilt then.
     [[nodiscard]] bool expandObject(const MacroName& name, TextBuffer& to);
 
-    /// The same for the call of a function-like macro whose "(" is at `open`, with all that it
-    /// needs before `end`. Returns where the call ends, or null if that is not told. No name is
-    /// watched.
-    [[nodiscard]] const char* expandCall(const MacroName& name, const char* open, const char* end,
+    /// The same for the call of a function-like macro, of whose name the end is at `behind`, with
+    /// all that it needs before `end`. Returns where the call ends, or null if that is not told. No
+    /// name is watched.
+    [[nodiscard]] const char* expandCall(const MacroName& name, const char* behind, const char* end,
                                          TextBuffer& to);
 
 private:
@@ -49,8 +49,6 @@ private:
         bool hasMacros = false;  // names of macros were left in it
     };
 
-    void begin(bool watches) noexcept;
-
     // A text that is read.
     struct Reading {
         const char* at;
@@ -59,6 +57,8 @@ private:
         Place place;
     };
 
+    [[nodiscard]] const char* expand(const MacroName& name, const char* behind, const char* end,
+                                     TextBuffer& to);
     [[nodiscard]] bool read(std::string_view text, const std::vector<TextBuffer::Part>& settled,
                             Place place, Result& result);
     [[nodiscard]] bool readUpTo(const char* end, Reading& reading, Result& result);
@@ -76,7 +76,7 @@ private:
                                  std::size_t firstArgument, Result& result);
     [[nodiscard]] bool isPlain(std::string_view text, bool& hasMacros);
     [[nodiscard]] static bool add(std::string_view text, Result& result);
-    [[nodiscard]] static bool addPart(std::string_view text, bool isSettled, Result& result);
+    [[nodiscard]] bool addPart(std::string_view text, bool isSettled, Result& result);
     [[nodiscard]] bool hasMacros(const MacroBody& body, const BodyStep& step);
     [[nodiscard]] const MacroName* macroOf(std::string_view name);
     [[nodiscard]] bool isAround(const MacroName& name) const;
