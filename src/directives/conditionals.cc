@@ -208,7 +208,21 @@ std::optional<bool> Conditionals::isDefined(DirectiveLine& line) {
 }
 
 std::optional<bool> Conditionals::isTrue(DirectiveLine& line) {
-    byteTokens_.read(line);
+    const KnownConditions::Place known =
+        knownConditions_.meet(line.bytesToLineFeed(), macros_.version());
+    if (known.value) {
+        line.passBytes(known.text.size());
+        return known.value;
+    }
+    const std::optional<bool> value = valueOf(line, known.comesAgain);
+    if (value && known.comesAgain && line.isOneLine()) {
+        knownConditions_.keep(known, *value, macros_.version());
+    }
+    return value;
+}
+
+std::optional<bool> Conditionals::valueOf(DirectiveLine& line, bool watchesNames) {
+    byteTokens_.read(line, watchesNames);
     bool ok = true;
     ExprValue value;
     try {

@@ -7,6 +7,7 @@
 #include <string_view>
 
 #include "directives/conditional_stack.h"
+#include "directives/known_conditions.h"
 #include "expr/evaluator.h"
 #include "lex/directive_line.h"
 #include "lex/reporter.h"
@@ -76,6 +77,7 @@ private:
     [[nodiscard]] std::optional<bool> condition(DirectiveLine& line);
     [[nodiscard]] std::optional<bool> isDefined(DirectiveLine& line);
     [[nodiscard]] std::optional<bool> isTrue(DirectiveLine& line);
+    [[nodiscard]] std::optional<bool> valueOf(DirectiveLine& line, bool watchesNames);
 
     ScannerStack& sources_;
     MacroTable& macros_;
@@ -85,6 +87,7 @@ private:
     Evaluator<ScannerStack> evaluator_;
     ConditionTokens byteTokens_;
     Evaluator<ConditionTokens> byteEvaluator_;
+    KnownConditions knownConditions_;
     ConditionalStack groups_;
     std::size_t decisions_ = 0;
     const Name* lastGuard_ = nullptr;

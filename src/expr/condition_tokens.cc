@@ -31,8 +31,9 @@ constexpr std::size_t kDeepest = 16;
 
 }  // namespace
 
-void ConditionTokens::read(DirectiveLine& line) {
+void ConditionTokens::read(DirectiveLine& line, bool watchesNames) {
     line_ = &line;
+    watchesNames_ = watchesNames;
     replacements_.clear();
     peeked_ = {};
     isApart_ = true;
@@ -48,6 +49,9 @@ void ConditionTokens::scan() {
         const Token token = scanUnexpanded();
         if (token.kind == END_OF_INPUT) {
             break;
+        }
+        if (watchesNames_ && isName(token.kind)) {
+            macros_.watch(token.text);
         }
         if (!isProtected(token.kind) && isName(token.kind) && beginReplacement(token.text)) {
             continue;

@@ -20,8 +20,9 @@ class ConditionTokens final : public Reporter {
 public:
     explicit ConditionTokens(MacroTable& macros) noexcept : macros_(macros) {}
 
-    /// Begins to read a line where its reading stands. The line is borrowed.
-    void read(DirectiveLine& line);
+    /// Begins to read a line where its reading stands. The line is borrowed. The names met are
+    /// watched, or not.
+    void read(DirectiveLine& line, bool watchesNames = false);
 
     /// Returns false once something was met that cannot be told from the bytes. The condition seems
     /// to end there.
@@ -78,6 +79,7 @@ private:
     Expected expected_ = Expected::Anything;
     bool hasPeek_ = false;
     bool isTold_ = true;
+    bool watchesNames_ = false;
 };
 
 }  // namespace umpre

@@ -117,6 +117,15 @@ std::optional<std::string_view> DirectiveLine::readText(std::string& memory) {
     }
 }
 
+std::string_view DirectiveLine::bytesToLineFeed() const noexcept {
+    const char* at = at_;
+    ByteBlock::Mask lineFeeds = 0;
+    while ((lineFeeds = ByteBlock(at).any('\n')) == 0) {
+        at += ByteBlock::kSize;
+    }
+    return {at_, static_cast<std::size_t>(at - at_) + firstBit(lineFeeds)};
+}
+
 bool DirectiveLine::skipRest() {
     const char* end = nullptr;
     while (!isAtEnd() && at_ != end) {
