@@ -16,7 +16,8 @@ build_packages=(
 )
 test_packages=(
     "python3|python3|runs the golden cases"
-    "make|make|the other of the two generators that a sample is built with"
+    "make|make|builds a sample, by its own rules and by those of CMake"
+    "meson|meson|builds a sample by its own rules"
     "time|/usr/bin/time|takes the memory of a program, which a shell cannot"
     "libgtest-dev|/usr/include/gtest/gtest.h|the unit tests' framework"
     "zlib1g-dev|/usr/include/zlib.h|headers to preprocess"
