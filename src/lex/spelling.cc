@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "lex/spelling.h"
 
+#include <algorithm>
 #include <array>
 #include <bit>
 #include <cstddef>
@@ -14,7 +15,22 @@ namespace {
 
 using enum TokenKind;
 
-constexpr std::size_t kLongestWord = 7;
+struct Word {
+    std::string_view text;
+    TokenKind kind;
+};
+
+// The words that are no identifiers, of two to eight bytes each.
+constexpr std::array kWords{
+    Word{"if", KW_IF},           Word{"ifdef", KW_IFDEF},     Word{"ifndef", KW_IFNDEF},
+    Word{"else", KW_ELSE},       Word{"elif", KW_ELIF},       Word{"endif", KW_ENDIF},
+    Word{"include", KW_INCLUDE}, Word{"define", KW_DEFINE},   Word{"undef", KW_UNDEF},
+    Word{"line", KW_LINE},       Word{"error", KW_ERROR},     Word{"pragma", KW_PRAGMA},
+    Word{"ident", KW_IDENT},     Word{"defined", KW_DEFINED},
+};
+
+constexpr std::size_t kLongestWord =
+    std::ranges::max(kWords, {}, [](const Word& word) { return word.text.size(); }).text.size();
 
 // A word of up to eight bytes as a number, the first byte in the lowest bits.
 [[nodiscard]] constexpr std::uint64_t packed(std::string_view word) noexcept {
@@ -40,41 +56,40 @@ constexpr std::size_t kLongestWord = 7;
     return word.size() < sizeof(std::uint32_t) ? join(std::uint16_t{}) : join(std::uint32_t{});
 }
 
-// The words that are no identifiers, each in the place that its number leads to.
-struct Words {
-    struct Word {
+// The words, each in the place that its number and the factor lead to.
+struct WordPlaces {
+    struct Place {
         std::uint64_t bytes = 0;
         TokenKind kind = IDENTIFIER;
     };
 
-    [[nodiscard]] static constexpr std::size_t placeOf(std::uint64_t bytes) noexcept {
-        return bytes * 0x44D565AD0A4E8BD5U >> 60U;  // found by trying: all places differ
+    [[nodiscard]] constexpr std::size_t placeOf(std::uint64_t bytes) const noexcept {
+        return bytes * factor >> 59U;
     }
 
-    constexpr void add(std::string_view word, TokenKind kind) {
-        Word& place = places[placeOf(packed(word))];
-        place = place.bytes == 0 ? Word{packed(word), kind} : throw kind;
+    // Returns whether all places differ.
+    [[nodiscard]] constexpr bool fill() noexcept {
+        places = {};
+        for (const Word& word : kWords) {
+            const std::uint64_t bytes = packed(word.text);
+            Place& place = places[placeOf(bytes)];
+            if (place.bytes != 0) {
+                return false;
+            }
+            place = {bytes, word.kind};
+        }
+        return true;
     }
 
-    std::array<Word, 16> places{};
+    std::uint64_t factor = 0x9E3779B97F4A7C15U;
+    std::array<Place, 32> places{};
 };
 
-constexpr Words kWords = [] {
-    Words words;
-    words.add("if", KW_IF);
-    words.add("ifdef", KW_IFDEF);
-    words.add("ifndef", KW_IFNDEF);
-    words.add("else", KW_ELSE);
-    words.add("elif", KW_ELIF);
-    words.add("endif", KW_ENDIF);
-    words.add("include", KW_INCLUDE);
-    words.add("define", KW_DEFINE);
-    words.add("undef", KW_UNDEF);
-    words.add("line", KW_LINE);
-    words.add("error", KW_ERROR);
-    words.add("pragma", KW_PRAGMA);
-    words.add("ident", KW_IDENT);
-    words.add("defined", KW_DEFINED);
+constexpr WordPlaces kWordPlaces = [] {
+    WordPlaces words;
+    while (!words.fill()) {
+        words.factor = words.factor * 0x5851F42D4C957F2DU + 2;  // another odd number
+    }
     return words;
 }();
 
@@ -141,8 +156,8 @@ TokenKind kindOfName(std::string_view name) noexcept {
         return IDENTIFIER;
     }
     const std::uint64_t bytes = packedQuickly(name);
-    const Words::Word& word = kWords.places[Words::placeOf(bytes)];
-    return word.bytes == bytes ? word.kind : IDENTIFIER;
+    const WordPlaces::Place& place = kWordPlaces.places[kWordPlaces.placeOf(bytes)];
+    return place.bytes == bytes ? place.kind : IDENTIFIER;
 }
 
 const char* nameEndAhead(const char* at) noexcept {
