@@ -27,13 +27,19 @@ std::string printable(std::string_view bytes) {
     return text;
 }
 
+std::string differenceOf(std::string_view what, std::string_view found, std::string_view expected) {
+    return found == expected ? std::string()
+                             : std::string(what)
+                                   .append(" differs\n  is:\n    ")
+                                   .append(printable(found))
+                                   .append("\n  should be:\n    ")
+                                   .append(printable(expected));
+}
+
 void expectSame(std::string_view what, std::string_view found, std::string_view expected) {
-    if (found != expected) {
-        fail(std::string(what)
-                 .append(" differs\n  is:\n    ")
-                 .append(printable(found))
-                 .append("\n  should be:\n    ")
-                 .append(printable(expected)));
+    const std::string difference = differenceOf(what, found, expected);
+    if (!difference.empty()) {
+        fail(difference);
     }
 }
 

@@ -13,6 +13,10 @@ namespace umpre::fuzz {
 /// Returns bytes as they can be printed.
 [[nodiscard]] std::string printable(std::string_view bytes);
 
+/// Says how a text differs from what it should be; nothing if it does not.
+[[nodiscard]] std::string differenceOf(std::string_view what, std::string_view found,
+                                       std::string_view expected);
+
 /// Ends the process unless both texts are equal.
 void expectSame(std::string_view what, std::string_view found, std::string_view expected);
 
