@@ -3,13 +3,15 @@
 # with the library (component library).
 include(CMakePackageConfigHelpers)
 
-set(package_dir ${CMAKE_INSTALL_LIBDIR}/cmake/umpre)
+# Not in the folder for libraries: that may be one of an architecture, which a project without a language
+# does not search.
+set(package_dir ${CMAKE_INSTALL_DATADIR}/cmake/umpre)
 
 install(TARGETS umpre umpre-deps umpre-lines EXPORT umpreProgramTargets RUNTIME COMPONENT programs)
 install(FILES docs/umpre.1 docs/umpre-deps.1 docs/umpre-lines.1
     DESTINATION ${CMAKE_INSTALL_MANDIR}/man1 COMPONENT programs)
 install(FILES README.md CHANGELOG.md CONTRIBUTING.md LICENSE TYPE DOC COMPONENT programs)
-install(DIRECTORY docs TYPE DOC COMPONENT programs FILES_MATCHING PATTERN *.md)
+install(DIRECTORY docs TYPE DOC COMPONENT programs FILES_MATCHING PATTERN *.md PATTERN *.svg)
 install(FILES completions/umpre.bash RENAME umpre
     DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions COMPONENT programs)
 install(FILES completions/umpre.bash RENAME umpre-deps

@@ -26,18 +26,18 @@ include/umpre/event.h
 include/umpre/export.h
 include/umpre/preprocessing.h
 include/umpre/version.h
-lib/cmake/umpre/umpreConfig.cmake
-lib/cmake/umpre/umpreConfigVersion.cmake
-lib/cmake/umpre/umpreLibraryTargets-release.cmake
-lib/cmake/umpre/umpreLibraryTargets.cmake
-lib/cmake/umpre/umpreProgramTargets-release.cmake
-lib/cmake/umpre/umpreProgramTargets.cmake
-lib/cmake/umpre/umpre_preprocess.cmake
 lib/libumpre.a
 lib/pkgconfig/umpre.pc
 share/bash-completion/completions/umpre
 share/bash-completion/completions/umpre-deps
 share/bash-completion/completions/umpre-lines
+share/cmake/umpre/umpreConfig.cmake
+share/cmake/umpre/umpreConfigVersion.cmake
+share/cmake/umpre/umpreLibraryTargets-release.cmake
+share/cmake/umpre/umpreLibraryTargets.cmake
+share/cmake/umpre/umpreProgramTargets-release.cmake
+share/cmake/umpre/umpreProgramTargets.cmake
+share/cmake/umpre/umpre_preprocess.cmake
 share/doc/umpre/CHANGELOG.md
 share/doc/umpre/CONTRIBUTING.md
 share/doc/umpre/LICENSE
@@ -50,7 +50,8 @@ share/man/man1/umpre-lines.1
 share/man/man1/umpre.1
 share/zsh/site-functions/_umpre
 """.split()
-FILES += [f"share/doc/umpre/docs/{page.name}" for page in (ROOT / "docs").glob("*.md")]
+FILES += [f"share/doc/umpre/docs/{page.name}" for kind in ("*.md", "*.svg")
+          for page in (ROOT / "docs").glob(kind)]
 
 
 def run(*command, **options):
