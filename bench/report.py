@@ -56,13 +56,13 @@ def table(head, rows):
     return "".join("| " + " | ".join(line) + " |\n" for line in lines)
 
 
-def put(name, text):
-    """Replaces what stands between the two comments of this name on the page."""
+def put(name, text, page=PAGE):
+    """Replaces what stands between the two comments of this name on a page."""
     begin, end = f"<!-- {name}: begin -->\n", f"<!-- {name}: end -->\n"
-    before, _, rest = PAGE.read_text(encoding="utf-8").partition(begin)
+    before, _, rest = page.read_text(encoding="utf-8").partition(begin)
     _, _, after = rest.partition(end)
-    PAGE.write_text(before + begin + text + end + after, encoding="utf-8")
-    print(f"Wrote {name} into {PAGE.relative_to(ROOT)}")
+    page.write_text(before + begin + text + end + after, encoding="utf-8")
+    print(f"Wrote {name} into {page.relative_to(ROOT)}")
 
 
 def comparison_row(result):

@@ -59,6 +59,13 @@ class Bench(unittest.TestCase):
         self.assertEqual(done.returncode, 0, done.stdout + done.stderr)
         self.assertRegex(done.stdout, r"plain +-?[0-9.]+: ")
 
+    def test_a_build_of_a_few_sources_is_measured(self):
+        words = ["--sources", "3", "--runs", "1", "--umpre-deps", UMPRE + "-deps"]
+        command = [sys.executable, ROOT / "bench/thousand.py", *words]
+        done = subprocess.run(command, capture_output=True, text=True, check=False)
+        self.assertEqual(done.returncode, 0, done.stdout + done.stderr)
+        self.assertRegex(done.stdout, r"all \| 3 \| CPU time \|")
+
     def test_inputs_are_the_same_each_time(self):
         for name in MADE:
             with tempfile.TemporaryDirectory() as one, tempfile.TemporaryDirectory() as two:
