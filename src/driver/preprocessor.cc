@@ -240,10 +240,11 @@ void Preprocessor::writeToken(const Token& token) {
     output_.write(isName(token.kind) ? expander_.expandName(token) : token.text);
 }
 
-// Reads at least one token.
+// Reads at least one token. Where the line goes on behind the end of a file, what follows it need
+// not be skipped.
 void Preprocessor::endSkippedLine() {
     while (!output_.failed()) {
-        CppFileScanner* const file = byteSource();
+        CppFileScanner* const file = conditionals_.skipping() ? byteSource() : nullptr;
         if (file != nullptr && lineSkipper_.skip(*file, Stop::InLine) == Stop::LineStart) {
             return;
         }
