@@ -36,6 +36,9 @@ public:
 
     void clear() noexcept { size_ = 0; }
 
+    /// Takes away all but the first `size` elements.
+    void truncate(std::size_t size) noexcept { size_ = size; }
+
     /// Adds `count` elements and returns where they are to be written.
     [[nodiscard]] Element* extend(std::size_t count) {
         if (count > capacity_ - size_) {
@@ -44,6 +47,13 @@ public:
         Element* const added = elements_.data() + size_;
         size_ += count;
         return added;
+    }
+
+    /// Makes that so many elements behind the last one may be read.
+    void reserveBehind(std::size_t count) {
+        if (count > capacity_ - size_) {
+            grow(size_ + count);
+        }
     }
 
     [[nodiscard]] std::size_t size() const noexcept { return size_; }

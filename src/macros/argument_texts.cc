@@ -2,33 +2,13 @@
 #include "macros/argument_texts.h"
 
 #include <algorithm>
-#include <array>
 #include <functional>
 
 #include "lex/plain_text.h"
+#include "macros/text_places.h"
 
 namespace umpre {
 namespace {
-
-// What matters about a byte of an argument, at the beginning of a token.
-enum class Byte : unsigned char { Passed, Name, Number, Blank, Delimiter, Unusual };
-
-constexpr std::array<Byte, 256> kBytes = [] {
-    std::array<Byte, 256> bytes{};
-    for (std::size_t at = 0; at != bytes.size(); ++at) {
-        const char byte = static_cast<char>(at);
-        switch (textByte(byte)) {
-        case TextByte::Plain: bytes[at] = isBlankByte(byte) ? Byte::Blank : Byte::Passed; break;
-        case TextByte::Unusual: bytes[at] = Byte::Unusual; break;
-        case TextByte::Digit: bytes[at] = Byte::Number; break;
-        case TextByte::Name: bytes[at] = Byte::Name; break;
-        }
-    }
-    for (const char byte : std::string_view("(),")) {
-        bytes[static_cast<unsigned char>(byte)] = Byte::Delimiter;
-    }
-    return bytes;
-}();
 
 class Reader {
 public:
@@ -41,37 +21,51 @@ public:
         const char* const begin = at;
         std::size_t depth = 0;
         while (at != nullptr && at < end_) {
-            switch (kBytes[static_cast<unsigned char>(*at)]) {
-            case Byte::Passed: ++at; break;
-            case Byte::Name: at = passName(at, argument); break;
-            case Byte::Blank: {
-                const char* const behind = passBlanks(at, depth);
-                if (behind != nullptr && behind < end_ && endsArgument(behind, depth)) {
-                    argument.raw = {begin, static_cast<std::size_t>(at - begin)};
-                    return behind;
+            if (!isDelimiter(*at)) {
+                at = places_.next(at, end_);
+                if (at == end_) {
+                    return nullptr;
                 }
-                at = behind;
-                break;
             }
-            case Byte::Delimiter:
+            const char byte = *at;
+            if (isNameStart(byte)) {
+                at = passName(at, argument);
+            } else if (isDelimiter(byte)) {
                 if (endsArgument(at, depth)) {
-                    argument.raw = {begin, static_cast<std::size_t>(at - begin)};
+                    const bool endsWithSpace = at != begin && at[-1] == ' ';
+                    argument.raw = viewOf(begin, endsWithSpace ? at - 1 : at);
                     return at;
                 }
                 at = passDelimiter(at, depth, argument);
-                break;
-            case Byte::Number:
-            case Byte::Unusual: at = unusualTokenEnd(at, end_); break;
+            } else if (isDigit(byte)) {
+                at = places_.numberEndAt(at);
+            } else if (isBlankByte(byte)) {
+                const char* const behind = passBlanks(at, depth);
+                if (behind != nullptr && behind < end_ && endsArgument(behind, depth)) {
+                    argument.raw = viewOf(begin, at);
+                    return behind;
+                }
+                at = behind;
+            } else {
+                at = unusualTokenEnd(at, end_);
             }
         }
         return nullptr;
     }
 
 private:
+    [[nodiscard]] static bool isDelimiter(char byte) noexcept {
+        return byte == ',' || byte == '(' || byte == ')';
+    }
+
+    [[nodiscard]] static std::string_view viewOf(const char* begin, const char* end) noexcept {
+        return {begin, static_cast<std::size_t>(end - begin)};
+    }
+
     [[nodiscard]] const char* passName(const char* at, ArgumentText& argument) const {
-        const char* const behind = nameEnd(at);
-        const std::string_view name(at, static_cast<std::size_t>(behind - at));
-        argument.mayHaveMacros = argument.mayHaveMacros || macroNames_.mayHoldAmongBytes(name);
+        const char* const behind = places_.nameEndAt(at);
+        argument.mayHaveMacros =
+            argument.mayHaveMacros || macroNames_.mayHoldAmongBytes(viewOf(at, behind));
         return behind;
     }
 
@@ -108,6 +102,7 @@ private:
     const NameFilter& macroNames_;
     CallOutline& outline_;
     bool makesOutline_;
+    TextPlaces<PlacesFor::Arguments> places_;
 };
 
 }  // namespace

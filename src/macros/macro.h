@@ -30,7 +30,7 @@ struct MacroText {
 /// worked out at its first use.
 class Macro {
 public:
-    /// A zero byte follows it, and from each of its bytes eight can be read.
+    /// A zero byte follows it, and behind it so many bytes can be read as `kBytesBehind` says.
     [[nodiscard]] std::string_view text() const noexcept {
         return {bytes_ + parametersSize_, textSize_};
     }
@@ -41,6 +41,9 @@ public:
     [[nodiscard]] std::size_t parameterCount() const noexcept { return parameterCount_; }
 
     [[nodiscard]] bool functionLike() const noexcept { return functionLike_; }
+
+    /// Tells whether this is not the first definition of its name.
+    [[nodiscard]] bool isAnother() const noexcept { return isAnother_; }
 
     [[nodiscard]] bool wasUsed() const noexcept { return wasUsed_; }
 
@@ -64,6 +67,7 @@ private:
     std::uint32_t parameterCount_ = 0;
     bool functionLike_ = false;
     bool wasDefined_ = false;  // now or earlier
+    bool isAnother_ = false;
     mutable bool wasUsed_ = false;
 };
 

@@ -25,6 +25,9 @@ using enum TokenKind;
 // Of most bodies the steps and the operands.
 constexpr std::size_t kUsualSteps = 8;
 
+// The bytes of a definition whose body is kept beyond it.
+constexpr std::size_t kMostKept = 512;
+
 // The names of a macro's parameters. Of two with one name, the last counts.
 class ParameterNames {
 public:
@@ -225,7 +228,7 @@ private:
     bool failed_ = false;
 };
 
-void noteNames(MacroBody& body) {
+void noteTexts(MacroBody& body) {
     const LexedText& tokens = *body.tokens;
     for (BodyStep& step : body.steps) {
         if (step.kind == BodyStep::Kind::Tokens) {
@@ -236,6 +239,7 @@ void noteNames(MacroBody& body) {
                 }
             }
             step.lastName = body.names.size();
+            step.text = tokens.joined(step.first, step.last);
         }
     }
 }
@@ -268,21 +272,30 @@ SharedText BodyMaker::tokensOf(const Macro& macro) {
     return macro.tokens;
 }
 
-const MacroBody& BodyMaker::bodyOf(const Macro& macro) {
-    if (macro.body == nullptr) {
-        auto body = std::make_shared<MacroBody>();
-        body->tokens = SharedText::alone();
-        const SharedText source = lexer_.lexed(macro.text());
-        macros_.enterNames(source.edit());
-        BodyBuilder(macro, *source, *body).build();
-        body->isPlain = isPlainText(*source);
-        noteNames(*body);
-        if (source->hasEffects()) {
-            body->source = source;
-        }
-        macro.body = std::move(body);
+std::shared_ptr<const MacroBody> BodyMaker::newBody(const Macro& macro) {
+    auto body = std::make_shared<MacroBody>();
+    body->tokens = SharedText::alone();
+    const SharedText source = lexer_.lexed(macro.text());
+    macros_.enterNames(source.edit());
+    BodyBuilder(macro, *source, *body).build();
+    body->isPlain = isPlainText(*source);
+    noteTexts(*body);
+    if (source->hasEffects()) {
+        body->source = source;
     }
-    return *macro.body;
+    return body;
+}
+
+std::shared_ptr<const MacroBody> BodyMaker::keptBody(const Macro& macro) {
+    if (macro.text().size() + macro.parameters().size() > kMostKept) {
+        return newBody(macro);
+    }
+    KeptBody& kept = kept_[hashOfName(macro.text()) % kept_.size()];
+    if (kept.body == nullptr || kept.text != macro.text()
+        || kept.parameters != macro.parameters()) {
+        kept = {std::string(macro.parameters()), std::string(macro.text()), newBody(macro)};
+    }
+    return kept.body;
 }
 
 }  // namespace umpre

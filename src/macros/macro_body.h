@@ -2,7 +2,12 @@
 #ifndef UMPRE_MACROS_MACRO_BODY_H
 #define UMPRE_MACROS_MACRO_BODY_H
 
+#include <array>
 #include <cstddef>
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <string_view>
 #include <vector>
 
 #include "lex/lexed_text.h"
@@ -27,7 +32,8 @@ struct BodyStep {
     Kind kind = Kind::Tokens;
     std::size_t first = 0;
     std::size_t last = 0;  // not included
-    // For tokens, the names among them, of those of the body.
+    // For tokens, their texts, joined, and the names among them, of those of the body.
+    std::string_view text{};
     std::size_t firstName = 0;
     std::size_t lastName = 0;
 };
@@ -54,6 +60,9 @@ struct MacroBody {
     std::vector<const Name*> names;  // of the tokens that stay as they are
     /// Replacing is a matter of the bytes of this body and the arguments.
     bool isPlain = false;
+    // Whether `names` holds one of a macro, as of so many changes of the table.
+    mutable bool hasMacros = false;
+    mutable std::uint64_t changes = 0;
 };
 
 /// Makes bodies.
@@ -64,12 +73,30 @@ public:
     /// Returns the tokens of an object-like macro. They are kept from the second use on: of many
     /// macros that name each other each is often used once.
     [[nodiscard]] SharedText tokensOf(const Macro& macro);
+
     /// Returns the body of a function-like macro, made at the first use.
-    [[nodiscard]] const MacroBody& bodyOf(const Macro& macro);
+    [[nodiscard]] const MacroBody& bodyOf(const Macro& macro) {
+        if (macro.body == nullptr) {
+            macro.body = macro.isAnother() ? keptBody(macro) : newBody(macro);
+        }
+        return *macro.body;
+    }
 
 private:
+    // The body of a definition, by what the definition says.
+    struct KeptBody {
+        std::string parameters;
+        std::string text;
+        std::shared_ptr<const MacroBody> body;
+    };
+
+    [[nodiscard]] std::shared_ptr<const MacroBody> newBody(const Macro& macro);
+    [[nodiscard]] std::shared_ptr<const MacroBody> keptBody(const Macro& macro);
+
     TextLexer& lexer_;
     MacroTable& macros_;
+    // A name that is defined anew is often given one of few definitions in turn.
+    std::array<KeptBody, 64> kept_;
 };
 
 }  // namespace umpre

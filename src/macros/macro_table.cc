@@ -8,6 +8,8 @@
 
 #include <algorithm>
 
+#include "lex/file_bytes.h"
+
 namespace umpre {
 namespace {
 
@@ -96,6 +98,8 @@ void MacroTable::replace(MacroName& name, const MacroText& definition) {
     macro.tokens = {};
     macro.body.reset();
     macro.wasUsed_ = false;
+    macro.isAnother_ = macro.wasDefined_;
+    changes_ += name.isDefined ? 0U : 1U;
     name.isDefined = true;
     if (!macro.wasDefined_) {
         macro.wasDefined_ = true;
@@ -117,6 +121,7 @@ void MacroTable::undefine(std::string_view name) {
     if (entry != nullptr) {
         noteChange(name);
         entry->isDefined = false;
+        ++changes_;
         entry->macro.tokens = {};
         entry->macro.body.reset();
     }
@@ -170,12 +175,11 @@ MacroName& MacroTable::newName() {
     return names_.back().emplace_back();
 }
 
-// Readers of names look at eight bytes at a time, so that many can be read behind the last.
+// Readers look at many bytes at a time, so as many can be read behind the last.
 char* MacroTable::newBytes(std::size_t size) {
     constexpr std::size_t kBlock = std::size_t{32} * 1024;
-    constexpr std::size_t kReadable = 8;
-    if (size + kReadable > left_) {
-        left_ = std::max(size + kReadable, kBlock);
+    if (size + kBytesBehind > left_) {
+        left_ = std::max(size + kBytesBehind, kBlock);
         free_ = static_cast<char*>(bytes_.allocate(left_, 1));
     }
     left_ -= size;

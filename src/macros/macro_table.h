@@ -74,6 +74,10 @@ public:
     /// With another version, no names are watched at first.
     [[nodiscard]] std::uint64_t version() const noexcept { return version_; }
 
+    /// Returns a number, not 0, that is another one after each time that a name came to be defined
+    /// or undefined.
+    [[nodiscard]] std::uint64_t changes() const noexcept { return changes_; }
+
     /// Returns the filter that every defined name passes.
     [[nodiscard]] const NameFilter& filter() const noexcept { return filter_; }
 
@@ -107,6 +111,7 @@ private:
     NameFilter filter_;
     NameFilter watched_;  // by readers of definitions
     std::uint64_t version_ = 1;
+    std::uint64_t changes_ = 1;
     std::deque<Name> unknown_;  // the last one stands for what was never defined
     bool unknownIsNoted_ = false;
 };

@@ -5,9 +5,16 @@
 // quotes) the closing quote is taken for an escaped one, and the literal for going on.
 #include "macros/stringize.h"
 
+#include <algorithm>
+
 namespace umpre {
 
 void stringize(std::string_view rawText, std::string& result) {
+    const auto isSpecial = [](char byte) { return byte == '"' || byte == '\'' || byte == '\\'; };
+    if (std::none_of(rawText.begin(), rawText.end(), isSpecial)) {
+        result.append("\"").append(rawText).append("\"");
+        return;
+    }
     bool insideLiteral = false;
     bool escaped = false;
     result.push_back('"');

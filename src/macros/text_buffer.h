@@ -8,6 +8,7 @@
 #include <string_view>
 #include <vector>
 
+#include "lex/file_bytes.h"
 #include "lex/growing_array.h"
 
 namespace umpre {
@@ -50,6 +51,9 @@ public:
         }
     }
 
+    /// Takes away what was added behind the first `size` bytes, of which nothing is settled.
+    void truncate(std::size_t size) noexcept { bytes_.truncate(size); }
+
     /// Notes that the bytes from `begin` on are settled.
     void settleFrom(std::size_t begin) {
         if (begin == size()) {
@@ -70,11 +74,10 @@ public:
                    && settled_.front().end == size());
     }
 
-    /// Returns the text. A zero byte follows it.
-    [[nodiscard]] std::string_view view() noexcept {
-        if (empty()) {
-            return "";
-        }
+    /// Returns the text. A zero byte follows it, and so many bytes behind it can be read as
+    /// `kBytesBehind` says.
+    [[nodiscard]] std::string_view view() {
+        bytes_.reserveBehind(kBytesBehind);
         bytes_[size()] = '\0';
         return {bytes_.data(), size()};
     }

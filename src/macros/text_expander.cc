@@ -95,26 +95,26 @@ bool TextExpander::read(std::string_view text, const std::vector<TextBuffer::Par
 }
 
 bool TextExpander::readUpTo(const char* end, Reading& reading, Result& result) {
-    while (reading.at < end) {
-        const TextByte kind = textByte(*reading.at);
-        if (kind == TextByte::Plain) {
-            ++reading.at;
-        } else if (kind == TextByte::Name) {
+    while (reading.at != nullptr && reading.at < end) {
+        reading.at = reading.places.next(reading.at, end);
+        if (reading.at == end) {
+            return true;
+        }
+        if (isNameStart(*reading.at)) {
             if (!readName(reading, result)) {
                 return false;
             }
+        } else if (isDigit(*reading.at)) {
+            reading.at = reading.places.numberEndAt(reading.at);
         } else {
             reading.at = unusualTokenEnd(reading.at, end);
-            if (reading.at == nullptr) {
-                return false;
-            }
         }
     }
-    return true;
+    return reading.at != nullptr;
 }
 
 bool TextExpander::readName(Reading& reading, Result& result) {
-    const char* const behind = nameEnd(reading.at);
+    const char* const behind = reading.places.nameEndAt(reading.at);
     const MacroName* const name = macroOf(viewOf(reading.at, behind));
     if (name == nullptr) {
         reading.at = behind;
@@ -154,7 +154,7 @@ bool TextExpander::stays(const MacroName& name, const char* behind, const char* 
 // Adds what a macro is replaced by, and returns the end of what it took of the text.
 const char* TextExpander::replace(const MacroName& name, const char* behind, const char* end,
                                   Place place, Result& result) {
-    if (isRefreshed(name) || isAround(name)) {
+    if ((mayBeRefreshed(name) && isRefreshed(name)) || isAround(name)) {
         return nullptr;
     }
     if (!name.macro.functionLike()) {
@@ -178,63 +178,95 @@ const char* TextExpander::replaceCall(const MacroName& name, const char* open, c
     }
     work_ += static_cast<std::size_t>(behind - open);
     const MacroBody& body = bodies_.bodyOf(name.macro);
-    Result replacement{takeBuffer()};
-    if (!body.isPlain || !substitute(body, argumentsBefore, replacement)) {
+    if (!body.isPlain || !addReplacement(name, body, argumentsBefore, place, result)) {
         return nullptr;
-    }
-    TextBuffer& text = replacement.text;
-    bool isTold = false;
-    if (text.isSettled()) {
-        isTold = add(text.view(), result);
-    } else {
-        around_.push_back(&name);
-        isTold = read(text.view(), text.settled(), within(place), result);
-        around_.pop_back();
     }
     arguments_.resize(argumentsBefore);
     buffersUsed_ = buffersBefore;
-    return isTold ? behind : nullptr;
+    return behind;
+}
+
+// Adds what the call of a macro with these arguments is replaced by.
+bool TextExpander::addReplacement(const MacroName& name, const MacroBody& body,
+                                  std::size_t firstArgument, Place place, Result& result) {
+    if (!watches_ && !hasMacros(body)) {
+        const std::size_t before = result.text.size();
+        if (addSettled(body, firstArgument, result)) {
+            return true;
+        }
+        result.text.truncate(before);
+    }
+    Result replacement{takeBuffer()};
+    if (!substitute(body, firstArgument, replacement)) {
+        return false;
+    }
+    TextBuffer& text = replacement.text;
+    if (text.isSettled()) {
+        return add(text.view(), result);
+    }
+    around_.push_back(&name);
+    const bool isTold = read(text.view(), text.settled(), within(place), result);
+    around_.pop_back();
+    return isTold;
 }
 
 bool TextExpander::substitute(const MacroBody& body, std::size_t firstArgument, Result& result) {
-    bool isTold = true;
     for (const BodyStep& step : body.steps) {
-        switch (step.kind) {
-        case BodyStep::Kind::Tokens:
-            isTold =
-                addPart(body.tokens->joined(step.first, step.last), !hasMacros(body, step), result);
-            break;
-        case BodyStep::Kind::Argument:
-            isTold = addArgument(firstArgument + step.first, result);
-            break;
-        case BodyStep::Kind::Joined: isTold = addJoined(body, step, firstArgument, result); break;
-        default: isTold = false;
-        }
-        if (!isTold) {
+        const Part part = partOf(body, step, firstArgument);
+        if (part.text.data() == nullptr || !addPart(part.text, !part.hasMacros, result)) {
             return false;
         }
     }
     return true;
 }
 
-bool TextExpander::addArgument(std::size_t index, Result& result) {
-    if (!arguments_[index].mayHaveMacros && !watches_) {
-        return addPart(arguments_[index].raw, true, result);
-    }
-    if (!arguments_[index].expansion) {
-        Result expansion{takeBuffer()};
-        if (!read(arguments_[index].raw, kNoParts, Place::Argument, expansion)) {
+// Adds a replacement to what it becomes part of, without reading it again. Returns false if names
+// of macros are left in it, or if it is not told.
+bool TextExpander::addSettled(const MacroBody& body, std::size_t firstArgument, Result& result) {
+    for (const BodyStep& step : body.steps) {
+        Part part{step.text};
+        if (step.kind == BodyStep::Kind::Argument) {
+            ArgumentText& argument = arguments_[firstArgument + step.first];
+            part = argument.mayHaveMacros ? argumentPart(argument) : Part{argument.raw};
+        } else if (step.kind != BodyStep::Kind::Tokens) {
+            part = partOf(body, step, firstArgument);
+        }
+        if (part.text.data() == nullptr || part.hasMacros || isTooMuch(part.text.size())
+            || !add(part.text, result)) {
             return false;
+        }
+    }
+    return true;
+}
+
+TextExpander::Part TextExpander::partOf(const MacroBody& body, const BodyStep& step,
+                                        std::size_t firstArgument) {
+    switch (step.kind) {
+    case BodyStep::Kind::Tokens: return {step.text, hasMacros(body, step)};
+    case BodyStep::Kind::Argument: return argumentPart(arguments_[firstArgument + step.first]);
+    case BodyStep::Kind::Joined: return joinedPart(body, step, firstArgument);
+    default: return {};
+    }
+}
+
+TextExpander::Part TextExpander::argumentPart(ArgumentText& argument) {
+    if (!argument.mayHaveMacros && !watches_) {
+        return {argument.raw};
+    }
+    const std::size_t index = static_cast<std::size_t>(&argument - arguments_.data());
+    if (!argument.expansion) {
+        Result expansion{takeBuffer()};
+        if (!read(argument.raw, kNoParts, Place::Argument, expansion)) {
+            return {};
         }
         arguments_[index].expansion = expansion.text.view();
         arguments_[index].hasMacros = expansion.hasMacros;
     }
-    const ArgumentText& argument = arguments_[index];
-    return addPart(*argument.expansion, !argument.hasMacros, result);
+    return {*arguments_[index].expansion, arguments_[index].hasMacros};
 }
 
-bool TextExpander::addJoined(const MacroBody& body, const BodyStep& step, std::size_t firstArgument,
-                             Result& result) {
+TextExpander::Part TextExpander::joinedPart(const MacroBody& body, const BodyStep& step,
+                                            std::size_t firstArgument) {
     TextBuffer& joined = takeBuffer();
     for (std::size_t index = step.first; index < step.last; ++index) {
         const BodyOperand operand = body.operands[index];
@@ -248,8 +280,8 @@ bool TextExpander::addJoined(const MacroBody& body, const BodyStep& step, std::s
             joined.append(literal_);
         }
     }
-    bool hasMacros = false;
-    return isPlain(joined.view(), hasMacros) && addPart(joined.view(), !hasMacros, result);
+    Part part{joined.view()};
+    return isPlain(part.text, part.hasMacros) ? part : Part{};
 }
 
 // Tells whether a joined text yields tokens of text only, and notes whether there are names of
@@ -284,14 +316,29 @@ bool TextExpander::add(std::string_view text, Result& result) {
 // The same for a part of a replacement, which may be settled.
 bool TextExpander::addPart(std::string_view text, bool isSettled, Result& result) {
     const std::size_t begin = result.text.size();
-    work_ += text.size();
-    if (work_ > kMostWork || !add(text, result)) {
+    if (isTooMuch(text.size()) || !add(text, result)) {
         return false;
     }
     if (isSettled) {
         result.text.settleFrom(begin);
     }
     return true;
+}
+
+// Counts bytes that are written, and tells whether they were too many.
+bool TextExpander::isTooMuch(std::size_t bytes) {
+    work_ += bytes;
+    return work_ > kMostWork;
+}
+
+// Tells whether the tokens of a body hold names of macros.
+bool TextExpander::hasMacros(const MacroBody& body) const {
+    if (body.changes != macros_.changes()) {
+        const auto isMacro = [](const Name* name) { return name->isDefined; };
+        body.hasMacros = std::any_of(body.names.begin(), body.names.end(), isMacro);
+        body.changes = macros_.changes();
+    }
+    return body.hasMacros;
 }
 
 // Tells whether the tokens of a step hold names of macros.

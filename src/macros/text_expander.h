@@ -12,6 +12,7 @@
 #include "macros/macro_body.h"
 #include "macros/macro_table.h"
 #include "macros/text_buffer.h"
+#include "macros/text_places.h"
 
 namespace umpre {
 
@@ -49,12 +50,19 @@ private:
         bool hasMacros = false;  // names of macros were left in it
     };
 
+    // What a step adds to a replacement; without bytes if that is not told.
+    struct Part {
+        std::string_view text;
+        bool hasMacros = false;
+    };
+
     // A text that is read.
     struct Reading {
         const char* at;
         const char* end;
         const char* run;  // what is not added yet begins here
         Place place;
+        TextPlaces<PlacesFor::Tokens> places{};
     };
 
     [[nodiscard]] const char* expand(const MacroName& name, const char* behind, const char* end,
@@ -70,14 +78,21 @@ private:
     [[nodiscard]] static Place within(Place place) noexcept;
     [[nodiscard]] const char* replaceCall(const MacroName& name, const char* open, const char* end,
                                           Place place, Result& result);
+    [[nodiscard]] bool addReplacement(const MacroName& name, const MacroBody& body,
+                                      std::size_t firstArgument, Place place, Result& result);
     [[nodiscard]] bool substitute(const MacroBody& body, std::size_t firstArgument, Result& result);
-    [[nodiscard]] bool addArgument(std::size_t index, Result& result);
-    [[nodiscard]] bool addJoined(const MacroBody& body, const BodyStep& step,
-                                 std::size_t firstArgument, Result& result);
+    [[nodiscard]] bool addSettled(const MacroBody& body, std::size_t firstArgument, Result& result);
+    [[nodiscard]] Part partOf(const MacroBody& body, const BodyStep& step,
+                              std::size_t firstArgument);
+    [[nodiscard]] Part argumentPart(ArgumentText& argument);
+    [[nodiscard]] Part joinedPart(const MacroBody& body, const BodyStep& step,
+                                  std::size_t firstArgument);
     [[nodiscard]] bool isPlain(std::string_view text, bool& hasMacros);
+    [[nodiscard]] bool isTooMuch(std::size_t bytes);
     [[nodiscard]] static bool add(std::string_view text, Result& result);
     [[nodiscard]] bool addPart(std::string_view text, bool isSettled, Result& result);
     [[nodiscard]] bool hasMacros(const MacroBody& body, const BodyStep& step);
+    [[nodiscard]] bool hasMacros(const MacroBody& body) const;
     [[nodiscard]] const MacroName* macroOf(std::string_view name);
     [[nodiscard]] bool isAround(const MacroName& name) const;
     [[nodiscard]] TextBuffer& takeBuffer();

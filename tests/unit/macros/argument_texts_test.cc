@@ -7,6 +7,8 @@
 
 #include <gtest/gtest.h>
 
+#include "lex/file_bytes.h"
+
 namespace umpre {
 namespace {
 
@@ -18,7 +20,7 @@ namespace {
     CallOutline outline;
     std::vector<ArgumentText> arguments;
     // What is behind the end is not to be taken for the end of an argument.
-    const std::string padded = std::string(text) + ")       ";
+    const std::string padded = std::string(text) + std::string(kBytesBehind, ')');
     const char* const end = padded.data() + text.size();
     const char* const behind =
         takeArgumentTexts(padded.data(), end, count, names, outline, arguments);
@@ -67,6 +69,16 @@ TEST(ArgumentTexts, AreLeftIfBytesDoNotTell) {
           "(a\tb, c)", "(a\nb, c)", "(\na, c)", "(a, b\n)",   "(a /**/, b)", "(a, b//)",
           "(a, \")",   "(a, ')",    "(a, '')",  "(a, b\\\n)", "(a, \r)"}) {
         EXPECT_EQ(argumentsOf(text, 2), "(not told)") << text;
+    }
+}
+
+// Wherever it stands, so much of a text as is looked at together may end in it.
+TEST(ArgumentTexts, AreFoundBehindAnyNumberOfBytes) {
+    for (std::size_t count = 1; count < 140; ++count) {
+        const std::string before(count, 'a');
+        EXPECT_EQ(argumentsOf("(" + before + " \"N)\" N0 08N 0x1N , \t12 )", 2),
+                  "[" + before + " \"N)\" N0 08N 0x1N]![12]");
+        EXPECT_EQ(argumentsOf("(" + before + "  N)", 1), "(not told)");
     }
 }
 

@@ -134,6 +134,21 @@ TEST(MacroBody, OfAFunctionLikeMacroIsMadeOnce) {
     EXPECT_EQ(macro.body.get(), &body);
 }
 
+TEST(MacroBody, IsMadeOnceForDefinitionsThatTakeTurns) {
+    TextLexer lexer;
+    MacroTable macros;
+    BodyMaker maker(lexer, macros);
+    const auto bodyOf = [&](const MacroText& definition) {
+        return &maker.bodyOf(defined(macros, definition));
+    };
+    (void)bodyOf({"first", "", true});
+    const MacroBody* const one = bodyOf({"x + y", "x,y", true});
+    const MacroBody* const other = bodyOf({"x - y", "x,y", true});
+    EXPECT_EQ(bodyOf({"x + y", "x,y", true}), one);
+    EXPECT_EQ(bodyOf({"x - y", "x,y", true}), other);
+    EXPECT_NE(bodyOf({"x + y", "x,z", true}), one);
+}
+
 TEST(MacroBody, WithoutParametersIsOneRunOfTokens) {
     expectSteps({
         {"", ""},

@@ -7,6 +7,7 @@
 
 #include <gtest/gtest.h>
 
+#include "lex/file_bytes.h"
 #include "macros/predefined_macros.h"
 
 namespace umpre {
@@ -28,7 +29,7 @@ struct Fixture {
     // Expands what a text begins with: a name, or a name and its arguments. Puts "|" before the
     // rest.
     [[nodiscard]] std::string expanded(std::string_view text) {
-        const std::string all = std::string(text) + "        ";
+        const std::string all = std::string(text) + std::string(kBytesBehind, ' ');
         const std::string name(text.substr(0, text.find('(')));
         const char* const end = all.data() + text.size();
         TextBuffer result;
@@ -144,6 +145,7 @@ TEST(TextExpander, ExpandsCalls) {
         {"INNER(N)", "[3] 3 34"},
         {"F(F)", "[F]"},
         {"F(INNER)", "[INNER]"},
+        {"MEETING(<)", "<<"},
         {"F(SELF)"},
         {"ONE(SELF)"},
         {"F(N + SELF)"},
@@ -165,17 +167,19 @@ TEST(TextExpander, ExpandsCalls) {
         f.define("TABLE", "row", "row(1) row(2)");
         f.define("INNER", "x", "F(x) x JOIN(x, 4)");
         f.define("TWICE", "x", "x x");
+        f.define("MEETING", "a", "<a");
         EXPECT_EQ(f.expanded(row.text), row.expansion) << row.text;
     }
 }
 
 TEST(TextExpander, LeavesCallsThatAreMoreThanText) {
     for (const std::string_view text : {
-             "F(1",          "F(1\n)",      "F(1\\\n)",   "F(a /* b */)",  "F(a // b)",
-             "F(\"a)",       "F(')",        "F()",        "F(1, 2)",       "F(a  b)",
-             "F(a\tb)",      "F(__LINE__)", "F(F x)",     "F(ONE(SELF))",  "ONE(F)",
-             "MISPLACED(1)", "PASTE(1)",    "SLASHES(1)", "COMMENT(/, *)", "QUOTE(1)",
-             "MEET(+, 1)",   "MEETING(<)",
+             "F(1",        "F(1\n)",          "F(1\\\n)",      "F(a /* b */)",
+             "F(a // b)",  "F(\"a)",          "F(')",          "F()",
+             "F(1, 2)",    "F(a  b)",         "F(a\tb)",       "F(__LINE__)",
+             "F(F x)",     "F(ONE(SELF))",    "ONE(F)",        "MISPLACED(1)",
+             "PASTE(1)",   "SLASHES(1)",      "COMMENT(/, *)", "QUOTE(1)",
+             "MEET(+, 1)", "ONE(MEETING(<))",
          }) {
         Fixture f;
         f.define("SELF", "SELF");
