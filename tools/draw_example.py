@@ -105,7 +105,7 @@ def drawn(command, files, output):
     return "\n".join([
         f'<svg xmlns="http://www.w3.org/2000/svg" viewBox="0 0 {width} {height}" width="{width}"'
         f' height="{height}" role="img">',
-        "<!-- SPDX-License-Identifier: MIT, drawn by tools/draw_example.py -->",
+        "<!-- Drawn by tools/draw_example.py. -->",
         f"<title>{escape(command)}</title>", f"<style>{STYLE}</style>",
         f'<rect class="ground" x="0.5" y="0.5" width="{width - 1}" height="{height - 1}" rx="8"/>',
         *parts, "</svg>", ""])
