@@ -44,10 +44,9 @@ foreach(name umpre libumpre-dev)
     if(programs)
         debian_run(strip --remove-section=.comment --remove-section=.note ${programs})
     endif()
-    # Code for optimisation by the linker is for one version of one compiler only.
     file(GLOB archives ${root}/lib/*/*.a)
     if(archives)
         debian_run(strip --strip-debug --enable-deterministic-archives --remove-section=.comment
-            --remove-section=.note --remove-section=.gnu.lto_* ${archives})
+            --remove-section=.note ${archives})
     endif()
 endforeach()

@@ -39,6 +39,16 @@ install(TARGETS umpre_lib EXPORT umpreLibraryTargets
     LIBRARY COMPONENT library
     ARCHIVE COMPONENT library
     FILE_SET HEADERS COMPONENT library)
+# Objects for optimisation by the linker are for one version of one compiler, and linking with them takes
+# seconds.
+if(CMAKE_INTERPROCEDURAL_OPTIMIZATION AND CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND NOT BUILD_SHARED_LIBS)
+    install(CODE "
+        cmake_path(APPEND CMAKE_INSTALL_PREFIX ${CMAKE_INSTALL_LIBDIR} $<TARGET_FILE_NAME:umpre_lib>
+            OUTPUT_VARIABLE archive)
+        execute_process(COMMAND ${CMAKE_OBJCOPY} --enable-deterministic-archives
+            --remove-section=.gnu.lto_* \"\$ENV{DESTDIR}\${archive}\" COMMAND_ERROR_IS_FATAL ANY)"
+        COMPONENT library)
+endif()
 install(EXPORT umpreLibraryTargets NAMESPACE umpre:: DESTINATION ${package_dir} COMPONENT library)
 
 # Beside the folder that it is in, so that the installation can be moved.
