@@ -1,7 +1,6 @@
 // SPDX-License-Identifier: MIT
 #include "directives/line_skipper.h"
 
-#include <array>
 #include <cstddef>
 #include <string>
 #include <string_view>
@@ -9,9 +8,7 @@
 
 #include <gtest/gtest.h>
 
-#include "support/recording_comment_sink.h"
-#include "support/recording_sink.h"
-#include "support/temporary_directory.h"
+#include "support/file_fixture.h"
 
 namespace umpre {
 namespace {
@@ -20,27 +17,13 @@ using std::string_view_literals::operator""sv;
 using Stop = LineSkipper::Stop;
 using enum TokenKind;
 
-// A file that is read through windows, and an output in step with it.
-struct Skipping {
-    Skipping(std::string_view text, std::size_t windowSize) : file(comments, {false, windowSize}) {
-        isOpen = file.open(directory.write("main", text));
-        output.redirect(sink);
-        output.countLines(1);
+// A file of which all is skipped.
+struct Skipping : testing::FileFixture {
+    Skipping(std::string_view text, std::size_t windowSize) : FileFixture(text, windowSize) {
         groups.open();
         groups.decide(false);
     }
 
-    [[nodiscard]] const std::string& written() {
-        output.flush();
-        return sink.bytes();
-    }
-
-    testing::TemporaryDirectory directory;
-    testing::RecordingCommentSink comments;
-    CppFileScanner file;
-    bool isOpen = false;
-    testing::RecordingSink sink;
-    OutputWriter output;
     ConditionalStack groups;
     LineSkipper skipper{output, groups};
 };
@@ -180,11 +163,11 @@ TEST(LineSkipper, LeavesWhatTheWindowDoesNotHoldToTheScanner) {
 TEST(LineSkipper, KeepsTheOutputInStep) {
     Skipping skipping("a\nb\n\n#else\n", 1024);
     EXPECT_EQ(skipping.skipper.skip(skipping.file, Stop::LineStart), Stop::LineStart);
-    EXPECT_TRUE(skipping.output.isAt(skipping.file.position()));
+    EXPECT_TRUE(skipping.isInStep());
     Skipping comment("/*\n*/\n#else\n", 1024);
     EXPECT_EQ(comment.skipper.skip(comment.file, Stop::LineStart), Stop::LineStart);
     EXPECT_EQ(comment.file.position().line, 3);
-    EXPECT_FALSE(comment.output.isAt(comment.file.position()));
+    EXPECT_FALSE(comment.isInStep());
 }
 
 }  // namespace

@@ -10,9 +10,7 @@
 
 #include <gtest/gtest.h>
 
-#include "support/recording_comment_sink.h"
-#include "support/recording_sink.h"
-#include "support/temporary_directory.h"
+#include "support/file_fixture.h"
 
 namespace umpre {
 namespace {
@@ -23,8 +21,6 @@ using enum TokenKind;
 
 constexpr auto kWindowSizes = std::to_array<std::size_t>({1, 2, 3, 7, 64 * 1024});
 
-// A file that is read through windows, and an output in step with it. MACRO is the one name that
-// may be a macro's.
 // Tells what becomes of "KNOWN" and, up to its ")", of "CALL(...)", and of no other name.
 struct MacroOfOneText : NameReader {
     [[nodiscard]] Outcome readName(std::string_view name, const char* end) override {
@@ -39,32 +35,14 @@ struct MacroOfOneText : NameReader {
     }
 };
 
-struct Reading {
-    Reading(std::string_view text, std::size_t windowSize) : file(comments, {false, windowSize}) {
-        isOpen = file.open(directory.write("main", text));
-        file.setFileName("main");
-        output.redirect(sink);
-        output.countLines(1);
-        names.add("MACRO");
-        names.add("defined");
-        for (const char* const name : {"KNOWN", "CALL", "OTHER"}) {
+// A file whose text is copied. MACRO is a name that may be a macro's, and is not told.
+struct Reading : testing::FileFixture {
+    Reading(std::string_view text, std::size_t windowSize) : FileFixture(text, windowSize) {
+        for (const char* const name : {"MACRO", "defined", "KNOWN", "CALL", "OTHER"}) {
             names.add(name);
         }
     }
 
-    [[nodiscard]] const std::string& written() {
-        output.flush();
-        return sink.bytes();
-    }
-
-    [[nodiscard]] bool isInStep() const { return output.isAt(file.position()); }
-
-    testing::TemporaryDirectory directory;
-    testing::RecordingCommentSink comments;
-    CppFileScanner file;
-    bool isOpen = false;
-    testing::RecordingSink sink;
-    OutputWriter output;
     NameFilter names;
     MacroOfOneText macros;
     TextReader reader{output, names, macros};
