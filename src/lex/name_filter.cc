@@ -16,15 +16,19 @@ NameFilter::NameFilter() : bits_((std::size_t{1} << kLeastBits) / 64), shift_(32
 
 void NameFilter::add(std::string_view name) {
     std::array<char, kChunk> bytes{};
-    hashes_.push_back(hashOf(padded(name, bytes)));
-    if (hashes_.size() * kBitsForEach > bits_.size() * 64 && shift_ > 32 - kMostBits) {
-        grow();
+    const std::uint32_t hash = hashOf(padded(name, bytes));
+    ++size_;
+    if (shift_ > 32 - kMostBits) {
+        hashes_.push_back(hash);
+        if (size_ * kBitsForEach > bits_.size() * 64) {
+            grow();
+        }
     }
-    const std::uint32_t bit = hashes_.back() >> shift_;
-    bits_[bit / 64] |= std::uint64_t{1} << bit % 64;
+    addBit(hash);
 }
 
 void NameFilter::clear() noexcept {
+    size_ = 0;
     hashes_.clear();
     std::fill(bits_.begin(), bits_.end(), 0);
 }
@@ -33,8 +37,10 @@ void NameFilter::grow() {
     --shift_;
     bits_.assign(2 * bits_.size(), 0);
     for (const std::uint32_t hash : hashes_) {
-        const std::uint32_t bit = hash >> shift_;
-        bits_[bit / 64] |= std::uint64_t{1} << bit % 64;
+        addBit(hash);
+    }
+    if (shift_ == 32 - kMostBits) {
+        hashes_ = {};
     }
 }
 

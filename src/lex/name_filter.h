@@ -53,7 +53,7 @@ public:
     void clear() noexcept;
 
     /// Returns how many names were added.
-    [[nodiscard]] std::size_t size() const noexcept { return hashes_.size(); }
+    [[nodiscard]] std::size_t size() const noexcept { return size_; }
 
     /// Returns false only if the name was never added.
     [[nodiscard]] bool mayHold(std::string_view name) const noexcept {
@@ -98,6 +98,11 @@ private:
         return static_cast<std::uint32_t>(sum * 0x9E3779B97F4A7C15U >> 32U);
     }
 
+    void addBit(std::uint32_t hash) noexcept {
+        const std::uint32_t bit = hash >> shift_;
+        bits_[bit / 64] |= std::uint64_t{1} << bit % 64;
+    }
+
     void grow();
 
     // The masks of the first bytes in memory of a chunk.
@@ -113,7 +118,8 @@ private:
 
     std::vector<std::uint64_t> bits_;
     unsigned shift_;                     // a hash shifted by this is the place of its bit
-    std::vector<std::uint32_t> hashes_;  // of the names added
+    std::size_t size_ = 0;               // names
+    std::vector<std::uint32_t> hashes_;  // of the names added, while it may grow
 };
 
 }  // namespace umpre

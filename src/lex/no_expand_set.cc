@@ -59,11 +59,14 @@ std::size_t NoExpandSets::KeyHash::operator()(const Key& key) const noexcept {
 }
 
 NoExpandSet NoExpandSets::with(NoExpandSet set, const Name& name) {
-    if (name.extension == NoExpandSet() || name.extended != set) {
-        name.extended = set;
-        name.extension = contains(set, name) ? set : extend(set, name);
+    if (name.extension == nullptr) {
+        name.extension = &extensions_.emplace_back();
     }
-    return name.extension;
+    NameExtension& last = *name.extension;
+    if (last.result == NoExpandSet() || last.of != set) {
+        last = {set, contains(set, name) ? set : extend(set, name)};
+    }
+    return last.result;
 }
 
 NoExpandSet NoExpandSets::extend(NoExpandSet set, const Name& name) {

@@ -44,15 +44,19 @@ private:
     const Node* node_ = nullptr;
 };
 
+/// Which set a name was last added to, and what that gave.
+struct NameExtension {
+    NoExpandSet of;
+    NoExpandSet result;
+};
+
 /// A name that is or was a macro's, or that may become one. There is one such object for each
 /// spelling, so its address says which name it is.
 struct Name {
     std::string_view text;
     bool isDefined = false;         ///< there is a macro of this name now
     mutable bool isMarked = false;  ///< by NoExpandSets, which looks into large sets that way
-    // Which set the name was last added to, and what that gave.
-    mutable NoExpandSet extended{};
-    mutable NoExpandSet extension{};
+    mutable NameExtension* extension = nullptr;  ///< NoExpandSets' own
 };
 
 /// Makes and owns the sets of a run. Small sets made by adding the same names in the same order are
@@ -99,6 +103,7 @@ private:
     [[nodiscard]] const Node* add(const Node* rest, const Name& name);
 
     std::deque<Node> nodes_;
+    std::deque<NameExtension> extensions_;                    // of the names that were added
     std::unordered_map<Key, const Node*, KeyHash> extended_;  // (set, name) to set
     std::unordered_map<Key, NoExpandSet, KeyHash> unions_;    // (set, set) to set
     Key lastUnited_{nullptr, nullptr};

@@ -7,6 +7,7 @@
 #include <cstdint>
 #include <memory>
 #include <string_view>
+#include <type_traits>
 
 #include "lex/no_expand_set.h"
 #include "lex/shared_text.h"
@@ -14,6 +15,13 @@
 namespace umpre {
 
 struct MacroBody;
+
+/// A definition made ready for uses, of an object-like macro and of a function-like one; nothing
+/// until that is worth keeping.
+struct MacroUse {
+    SharedText tokens;
+    std::shared_ptr<const MacroBody> body;
+};
 
 /// What a definition says, as views of somebody else's bytes.
 struct MacroText {
@@ -49,16 +57,15 @@ public:
 
     void noteUse() const noexcept { wasUsed_ = true; }
 
-    /// The text made ready for use, of an object-like macro and of a function-like one; nothing
-    /// until that is worth keeping.
-    mutable SharedText tokens;
-    mutable std::shared_ptr<const MacroBody> body;
+    /// Returns what `MacroTable::useOf` made, or null.
+    [[nodiscard]] const MacroUse* use() const noexcept { return use_; }
 
 private:
     friend class MacroTable;
 
     // Large inputs have many definitions, so the members are as small as they can be.
 
+    mutable MacroUse* use_ = nullptr;  // the table's
     // The parameters, behind them the text and a zero byte.
     char* bytes_ = nullptr;
     std::size_t textSize_ = 0;
@@ -83,9 +90,11 @@ struct Expansion {
 struct alignas(64) MacroName : Name {
     mutable Expansion expansion;
     /// The bytes of a name that they suffice for.
-    std::array<char, 64> shortName{};
+    std::array<char, 32> shortName{};
     Macro macro;
 };
+
+static_assert(std::is_trivially_destructible_v<MacroName>);
 
 }  // namespace umpre
 

@@ -257,8 +257,8 @@ void noteTexts(MacroBody& body) {
 }  // namespace
 
 SharedText BodyMaker::tokensOf(const Macro& macro) {
-    if (macro.tokens) {
-        return macro.tokens;
+    if (macro.use() != nullptr && macro.use()->tokens) {
+        return macro.use()->tokens;
     }
     if (!macro.wasUsed()) {
         macro.noteUse();
@@ -266,10 +266,11 @@ SharedText BodyMaker::tokensOf(const Macro& macro) {
         macros_.setNames(tokens.edit());
         return tokens;
     }
-    macro.tokens = SharedText::alone();
-    lexer_.append(macro.tokens.edit(), macro.text());
-    macros_.enterNames(macro.tokens.edit());
-    return macro.tokens;
+    SharedText& tokens = macros_.useOf(macro).tokens;
+    tokens = SharedText::alone();
+    lexer_.append(tokens.edit(), macro.text());
+    macros_.enterNames(tokens.edit());
+    return tokens;
 }
 
 std::shared_ptr<const MacroBody> BodyMaker::newBody(const Macro& macro) {

@@ -76,10 +76,11 @@ public:
 
     /// Returns the body of a function-like macro, made at the first use.
     [[nodiscard]] const MacroBody& bodyOf(const Macro& macro) {
-        if (macro.body == nullptr) {
-            macro.body = macro.isAnother() ? keptBody(macro) : newBody(macro);
+        MacroUse& use = macros_.useOf(macro);
+        if (use.body == nullptr) {
+            use.body = macro.isAnother() ? keptBody(macro) : newBody(macro);
         }
-        return *macro.body;
+        return *use.body;
     }
 
 private:

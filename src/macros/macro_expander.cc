@@ -95,9 +95,10 @@ MacroName* MacroExpander::entryOf(const Token& token) {
 }
 
 void MacroExpander::refresh(MacroName& name) {
-    std::shared_ptr<const MacroBody> before = name.macro.body;
+    const MacroUse& use = macros_.useOf(name.macro);
+    std::shared_ptr<const MacroBody> before = use.body;
     refreshPredefined(macros_, name, sources_.position());
-    if (!invocations_.empty() && before != name.macro.body) {
+    if (!invocations_.empty() && before != use.body) {
         retired_.push_back(std::move(before));
     }
 }

@@ -7,8 +7,10 @@
 #include "macros/macro_table.h"
 
 #include <algorithm>
+#include <new>
 
 #include "lex/file_bytes.h"
+#include "lex/page_request.h"
 
 namespace umpre {
 namespace {
@@ -95,8 +97,7 @@ void MacroTable::replace(MacroName& name, const MacroText& definition) {
     macro.parametersSize_ = static_cast<std::uint32_t>(parametersSize);
     macro.parameterCount_ = countOf(definition.parameters);
     macro.functionLike_ = definition.functionLike;
-    macro.tokens = {};
-    macro.body.reset();
+    dropUse(macro);
     macro.wasUsed_ = false;
     macro.isAnother_ = macro.wasDefined_;
     changes_ += name.isDefined ? 0U : 1U;
@@ -122,8 +123,7 @@ void MacroTable::undefine(std::string_view name) {
         noteChange(name);
         entry->isDefined = false;
         ++changes_;
-        entry->macro.tokens = {};
-        entry->macro.body.reset();
+        dropUse(entry->macro);
     }
 }
 
@@ -147,7 +147,7 @@ std::size_t MacroTable::slotOf(std::string_view name, std::uint32_t hash) {
 // once.
 bool MacroTable::holds(Slot slot, std::string_view name) {
     const MacroName& entry = nameIn(slot);
-    __builtin_prefetch(entry.shortName.data());
+    __builtin_prefetch(&entry.macro);
     return entry.text == name;
 }
 
@@ -169,10 +169,12 @@ MacroName& MacroTable::enter(std::string_view name) {
 }
 
 MacroName& MacroTable::newName() {
-    if (names_.empty() || names_.back().size() == kNamesTogether) {
-        names_.emplace_back().reserve(kNamesTogether);
+    const std::size_t place = (nameCount_ - 1) % kNamesTogether;
+    if (place == 0) {
+        void* const block = newBlock(kNamesTogether * sizeof(MacroName), alignof(MacroName));
+        names_.push_back(static_cast<MacroName*>(block));
     }
-    return names_.back().emplace_back();
+    return *new (names_.back() + place) MacroName();
 }
 
 // Readers look at many bytes at a time, so as many can be read behind the last.
@@ -180,15 +182,36 @@ char* MacroTable::newBytes(std::size_t size) {
     constexpr std::size_t kBlock = std::size_t{32} * 1024;
     if (size + kBytesBehind > left_) {
         left_ = std::max(size + kBytesBehind, kBlock);
-        free_ = static_cast<char*>(bytes_.allocate(left_, 1));
+        free_ = static_cast<char*>(newBlock(left_, 1));
     }
     left_ -= size;
     free_ += size;
     return free_ - size;
 }
 
+void* MacroTable::newBlock(std::size_t size, std::size_t alignment) {
+    // Small inputs use little of a block, and so does a definition that takes one by itself because
+    // it was given room to grow.
+    constexpr std::size_t kFew = std::size_t{128} * 1024;
+    void* const block = bytes_.allocate(size, alignment);
+    blockBytes_ += size;
+    if (blockBytes_ > kFew && size <= kFew) {
+        requestPages(block, size);
+    }
+    return block;
+}
+
+void MacroTable::dropUse(const Macro& macro) noexcept {
+    if (macro.use_ != nullptr) {
+        *macro.use_ = {};
+    }
+}
+
 void MacroTable::grow() {
-    std::vector<Slot> old(2 * slots_.size());
+    std::vector<Slot> old;
+    old.reserve(2 * slots_.size());
+    requestPages(old.data(), 2 * slots_.size() * sizeof(Slot));
+    old.resize(2 * slots_.size());
     old.swap(slots_);
     const std::size_t mask = slots_.size() - 1;
     for (const Slot& slot : old) {

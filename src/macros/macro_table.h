@@ -55,6 +55,14 @@ public:
     /// Replaces what a name is defined as. The views must not be of the name's own bytes.
     void replace(MacroName& name, const MacroText& definition);
 
+    /// Returns where what is worked out for the uses of a definition is kept.
+    [[nodiscard]] MacroUse& useOf(const Macro& macro) {
+        if (macro.use_ == nullptr) {
+            macro.use_ = &uses_.emplace_back();
+        }
+        return *macro.use_;
+    }
+
     /// Says that a name will be looked for soon.
     void prefetch(std::string_view name) const noexcept {
         __builtin_prefetch(&slots_[hashOfName(name) & (slots_.size() - 1)]);
@@ -98,6 +106,8 @@ private:
     [[nodiscard]] MacroName& enter(std::string_view name);
     [[nodiscard]] MacroName& newName();
     [[nodiscard]] char* newBytes(std::size_t size);
+    [[nodiscard]] void* newBlock(std::size_t size, std::size_t alignment);
+    static void dropUse(const Macro& macro) noexcept;
     void addToFilter(const Name& name);
     void noteChange(std::string_view name);
     void grow();
@@ -105,7 +115,9 @@ private:
     std::pmr::monotonic_buffer_resource bytes_;  // of names and definitions
     char* free_ = nullptr;                       // the rest of the last block
     std::size_t left_ = 0;
-    std::vector<std::vector<MacroName>> names_;  // each of them keeps its first room
+    std::size_t blockBytes_ = 0;     // of all blocks
+    std::vector<MacroName*> names_;  // arrays of `kNamesTogether`
+    std::deque<MacroUse> uses_;
     std::size_t nameCount_ = 0;
     std::vector<Slot> slots_;  // open addressing; at most three of four are taken
     NameFilter filter_;

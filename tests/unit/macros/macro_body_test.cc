@@ -104,7 +104,7 @@ TEST(MacroBody, OfAnObjectLikeMacroIsKeptFromTheSecondUseOn) {
     BodyMaker maker(lexer, macros);
     const Macro& macro = defined(macros, {"x", "", false});
     (void)maker.tokensOf(macro);
-    EXPECT_FALSE(macro.tokens);
+    EXPECT_EQ(macro.use(), nullptr);
     const SharedText second = maker.tokensOf(macro);
     const SharedText third = maker.tokensOf(macro);
     EXPECT_EQ(&*second, &*third);
@@ -128,10 +128,10 @@ TEST(MacroBody, OfAFunctionLikeMacroIsMadeOnce) {
     MacroTable macros;
     BodyMaker maker(lexer, macros);
     const Macro& macro = defined(macros, {"x", "x", true});
-    EXPECT_EQ(macro.body, nullptr);
+    EXPECT_EQ(macro.use(), nullptr);
     const MacroBody& body = maker.bodyOf(macro);
     EXPECT_EQ(&maker.bodyOf(macro), &body);
-    EXPECT_EQ(macro.body.get(), &body);
+    EXPECT_EQ(macro.use()->body.get(), &body);
 }
 
 TEST(MacroBody, IsMadeOnceForDefinitionsThatTakeTurns) {
