@@ -90,12 +90,19 @@ public:
         return maskOf([](Part part) noexcept { return within<'0', 10>(part); });
     }
 
-    /// Returns where hexadecimal digits stand, in any case.
-    [[nodiscard]] Mask hexDigits() const noexcept {
-        return maskOf([](Part part) noexcept {
-            const Part lower = Vector::either(part, Vector::all(0x20));
-            return either(within<'a', 6>(lower), within<'0', 10>(part));
+    /// Returns the bytes with ASCII letters in lower case. What is no letter does not become one.
+    [[nodiscard]] BasicByteBlock lower() const noexcept {
+        BasicByteBlock lowered = *this;
+        forEachPart([&](auto part) {
+            lowered.parts_[part] = Vector::either(parts_[part], Vector::all(0x20));
         });
+        return lowered;
+    }
+
+    /// Returns where the first letters of the alphabet stand, in lower case.
+    template <int kCount>
+    [[nodiscard]] Mask firstLetters() const noexcept {
+        return maskOf([](Part part) noexcept { return within<'a', kCount>(part); });
     }
 
     /// Returns where blanks, control characters and bytes above 127 stand.

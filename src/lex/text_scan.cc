@@ -271,10 +271,12 @@ ByteBlock::Mask TextScan::namesIn(const Block& block) const noexcept {
 // if it may be a macro.
 ByteBlock::Mask TextScan::namesBehindNumbers(const Block& block, Mask numbers, Mask tails,
                                              Mask& found) const noexcept {
-    const Mask xs = block.bytes.any('x', 'X');
-    const Mask us = block.bytes.any('u', 'U');
-    const Mask ls = block.bytes.any('l', 'L');
-    const Mask hexDigits = block.bytes.hexDigits() & block.words;
+    const ByteBlock lower = block.bytes.lower();
+    const Mask xs = lower.any('x');
+    const Mask us = lower.any('u');
+    const Mask ls = lower.any('l');
+    const Mask digits = block.words & ~block.letters;
+    const Mask hexDigits = digits | (lower.firstLetters<6>() & block.letters);
     const Mask firstHexDigits = (((numbers & block.bytes.any('0')) << 1U & xs) << 1U) & hexDigits;
     const Mask behindHexDigits = (hexDigits + firstHexDigits) & ~hexDigits;
     const Mask behindDigits = (tails & ~(firstHexDigits >> 1U)) | behindHexDigits;
