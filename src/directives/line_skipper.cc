@@ -119,7 +119,7 @@ LineSkipper::Pass::Outcome LineSkipper::Pass::passLiteral() {
 }
 
 LineSkipper::Pass::Outcome LineSkipper::Pass::passSlash() {
-    if (at_[1] != '/' && at_[1] != '*') {
+    if (!isCommentSign(at_[1])) {
         ++at_;
         return std::nullopt;
     }

@@ -56,7 +56,7 @@ constexpr std::array<Class, 256> kClasses = [] {
 }
 
 [[nodiscard]] bool beginsComment(const char* at) noexcept {
-    return *at == '/' && (at[1] == '/' || at[1] == '*');
+    return *at == '/' && isCommentSign(at[1]);
 }
 
 [[nodiscard]] bool beginsContinuation(const char* at) noexcept {

@@ -36,6 +36,12 @@ namespace umpre {
     return byte == '\n' || byte == '\r';
 }
 
+/// Tells whether a byte makes a comment of the slash before it. Without a branch: which of the two
+/// it is cannot be predicted.
+[[nodiscard]] constexpr bool isCommentSign(char byte) noexcept {
+    return (static_cast<unsigned>(byte == '/') | static_cast<unsigned>(byte == '*')) != 0;
+}
+
 inline constexpr std::array<bool, 256> kIsWordByte = [] {
     std::array<bool, 256> isWord{};
     for (std::size_t byte = 0; byte != isWord.size(); ++byte) {

@@ -40,7 +40,11 @@ namespace {
 }
 
 [[nodiscard]] bool beginsComment(const char* at, const char* end) noexcept {
-    return end - at > 1 && *at == '/' && (at[1] == '*' || at[1] == '/');
+    return end - at > 1 && *at == '/' && isCommentSign(at[1]);
+}
+
+[[nodiscard]] bool beginsLineComment(const char* at, const char* end) noexcept {
+    return end - at > 1 && *at == '/' && at[1] == '/';
 }
 
 }  // namespace
@@ -78,6 +82,8 @@ private:
 
     [[nodiscard]] Outcome beginLine(const char* start);
     [[nodiscard]] Outcome beginLine(const char* start, const char* behindBlanks);
+    [[nodiscard]] bool passLineComments(const char*& start, const char*& behindBlanks);
+    [[nodiscard]] bool needsNoLook(const char* start, const char* behindBlanks);
     [[nodiscard]] Beginning beginningOf(const char* behindBlanks);
     void beginText(const char* start, const Beginning& beginning);
     void writeBlanks(const char* start, const char* first);
@@ -212,6 +218,9 @@ TextReader::Pass::Outcome TextReader::Pass::beginLine(const char* start) {
 // Begins lines until one has text, or is one that needs no look at its beginning.
 TextReader::Pass::Outcome TextReader::Pass::beginLine(const char* start, const char* behindBlanks) {
     for (;;) {
+        if (passLineComments(start, behindBlanks) && needsNoLook(start, behindBlanks)) {
+            return std::nullopt;
+        }
         const Beginning beginning = beginningOf(behindBlanks);
         const char* const first = beginning.first;
         if (first == nullptr || first == pass_.end()) {
@@ -229,11 +238,41 @@ TextReader::Pass::Outcome TextReader::Pass::beginLine(const char* start, const c
         }
         start = endBlankLine(start, beginning);
         behindBlanks = blanksEnd(start, pass_.end());
-        if (inStep_ && !beginsComment(behindBlanks, pass_.end())) {
-            pass_.scan().resume(start, true);
+        if (needsNoLook(start, behindBlanks)) {
             return std::nullopt;
         }
     }
+}
+
+// Passes over lines with a line comment and nothing else, which come out as their line feeds.
+// Returns false if there are none.
+bool TextReader::Pass::passLineComments(const char*& start, const char*& behindBlanks) {
+    std::size_t count = 0;
+    while (beginsLineComment(behindBlanks, pass_.end())) {
+        const char* const lineEnd = pass_.commentAt(behindBlanks).end;
+        if (lineEnd == nullptr || *lineEnd != '\n') {
+            break;
+        }
+        if (run_ != start) {
+            writeUpTo(start);
+        }
+        ++count;
+        ++lineFeeds_;
+        run_ = start = lineEnd + 1;
+        behindBlanks = blanksEnd(start, pass_.end());
+    }
+    output_.countLines(count);
+    pass_.countLines(count);
+    return count != 0;
+}
+
+// Tells whether scanning may go on with the line that begins at `start`; it then does.
+bool TextReader::Pass::needsNoLook(const char* start, const char* behindBlanks) {
+    const bool needsNone = inStep_ && !beginsComment(behindBlanks, pass_.end());
+    if (needsNone) {
+        pass_.scan().resume(start, true);
+    }
+    return needsNone;
 }
 
 // Looks at what a line begins with behind its first blanks. Nothing is done yet about the comments

@@ -150,7 +150,7 @@ void TextScan::passAt(Block& block, const char* place) {
     case '"': passLiteral(block, place); return;
     case '\'': passCharacter(block, place); return;
     case '/':
-        if (place[1] == '/' || place[1] == '*') {
+        if (isCommentSign(place[1])) {
             stop(TextMark::Comment);
         }
         return;
