@@ -79,7 +79,7 @@ def cmake(generator):
 
 
 TOOLS = {
-    "make": lambda: Tool(block("Make") + MAKE_FOLLOW, "Makefile", [], ["make"]),
+    "make": lambda: Tool(block("Make") + MAKE_FOLLOW, "Makefile", [], ["make", "-j2"]),
     "ninja": lambda: Tool(block("Ninja") + NINJA_FOLLOW, "build.ninja", [], ["ninja"],
                           ("umpre clock.src\n",
                            "umpre clock.src\nbuild a$ b.txt: umpre a$ b.src\n")),
