@@ -126,14 +126,18 @@ private:
         forEach(action, std::make_index_sequence<kParts>{});
     }
 
-    [[nodiscard]] static Part equal(Part part, char byte) noexcept {
+    // What a comparison makes is bytes or, with some kinds of vectors, a mask already.
+    [[nodiscard]] static auto equal(Part part, char byte) noexcept {
         return Vector::equal(part, Vector::all(byte));
     }
 
-    [[nodiscard]] static Part either(Part only) noexcept { return only; }
+    template <typename Found>
+    [[nodiscard]] static Found either(Found only) noexcept {
+        return only;
+    }
 
-    template <typename... Parts>
-    [[nodiscard]] static Part either(Part first, Parts... others) noexcept {
+    template <typename Found, typename... Others>
+    [[nodiscard]] static Found either(Found first, Others... others) noexcept {
         return Vector::either(first, either(others...));
     }
 

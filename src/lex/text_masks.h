@@ -48,6 +48,9 @@ using TextMaskFinder = void (*)(const char* bytes, std::size_t count, BytesBefor
 /// kind of processor.
 [[nodiscard]] TextMaskFinder wideTextMaskFinder() noexcept;
 
+/// The same for processors with the widest vectors (AVX-512).
+[[nodiscard]] TextMaskFinder widestTextMaskFinder() noexcept;
+
 }  // namespace umpre
 
 #endif

@@ -10,6 +10,7 @@
 #include <immintrin.h>
 
 #include "lex/text_mask_loop.h"
+#include "lex/wide_counts.h"
 #endif
 
 namespace umpre {
@@ -17,7 +18,7 @@ namespace umpre {
 #if defined(__AVX2__)
 namespace {
 
-struct WideVector {
+struct WideVector : WideCounts<WideVector> {
     using Bytes = __m256i;
 
     static constexpr std::size_t kSize = sizeof(Bytes);
@@ -39,17 +40,6 @@ struct WideVector {
 
     [[nodiscard]] static std::uint32_t bits(Bytes bytes) noexcept {
         return static_cast<std::uint32_t>(_mm256_movemask_epi8(bytes));
-    }
-
-    [[nodiscard]] static std::size_t count(TextMasks::Mask mask) noexcept {
-        return static_cast<std::size_t>(__builtin_popcountll(mask));
-    }
-
-    // A product without carries, with a number that is all bits, sums up those at and below.
-    [[nodiscard]] static TextMasks::Mask parities(TextMasks::Mask mask) noexcept {
-        const __m128i product = _mm_clmulepi64_si128(
-            _mm_cvtsi64_si128(static_cast<std::int64_t>(mask)), _mm_set1_epi8(-1), 0);
-        return static_cast<TextMasks::Mask>(_mm_cvtsi128_si64(product));
     }
 };
 
