@@ -26,18 +26,18 @@ public:
         while (from < end) {
             const TextMasks* masks = &masksOf(from, end);
             const auto place = static_cast<std::size_t>(from - begin_) % ByteBlock::kSize;
-            const Mask first = ((masks->*kinds) | ...) >> place;
-            if (first != 0) {
-                return from + firstBit(first);
+            // Lines often end among the next 64 bytes; in which block they do cannot be predicted.
+            Mask found = ((masks->*kinds) | ...) >> place
+                         | ((masks[1].*kinds) | ...) << 1U << (ByteBlock::kSize - 1 - place);
+            if (found == 0) {
+                from -= place;
+                while (found == 0) {
+                    ++masks;
+                    from += ByteBlock::kSize;
+                    found = ((masks->*kinds) | ...);
+                }
             }
-            from -= place;
-            Mask found = 0;
-            while (found == 0) {
-                ++masks;
-                from += ByteBlock::kSize;
-                found = ((masks->*kinds) | ...);
-            }
-            if (from < begin_ + size_) {
+            if (from + firstBit(found) < begin_ + size_) {
                 return from + firstBit(found);
             }
             from = begin_ + size_;
