@@ -4,9 +4,11 @@
 
 #include <algorithm>
 #include <cstddef>
+#include <cstdlib>
+#include <memory>
+#include <new>
 #include <type_traits>
 #include <utility>
-#include <vector>
 
 namespace umpre {
 
@@ -44,43 +46,49 @@ public:
         if (count > capacity_ - size_) {
             grow(size_ + count);
         }
-        Element* const added = elements_.data() + size_;
+        Element* const added = elements_.get() + size_;
         size_ += count;
         return added;
     }
 
-    /// Makes that so many elements behind the last one may be read.
-    void reserveBehind(std::size_t count) {
-        if (count > capacity_ - size_) {
-            grow(size_ + count);
-        }
-    }
-
     [[nodiscard]] std::size_t size() const noexcept { return size_; }
 
-    [[nodiscard]] const Element* data() const noexcept { return elements_.data(); }
+    [[nodiscard]] const Element* data() const noexcept { return elements_.get(); }
 
-    [[nodiscard]] Element& operator[](std::size_t index) noexcept { return elements_[index]; }
+    [[nodiscard]] Element& operator[](std::size_t index) noexcept { return elements_.get()[index]; }
 
     [[nodiscard]] const Element& operator[](std::size_t index) const noexcept {
-        return elements_[index];
+        return elements_.get()[index];
     }
 
 private:
+    struct Free {
+        void operator()(Element* elements) const noexcept {
+            std::free(elements);  // NOLINT(cppcoreguidelines-no-malloc): grown with realloc
+        }
+    };
+
     void swap(GrowingArray& other) noexcept {
         std::swap(elements_, other.elements_);
         std::swap(size_, other.size_);
         std::swap(capacity_, other.capacity_);
     }
 
+    // A large array grows where its pages are: nothing is copied.
     void grow(std::size_t needed) {
         constexpr std::size_t kFirst = 32 / sizeof(Element);
         const std::size_t capacity = std::max({needed, 2 * capacity_, kFirst});
-        elements_.resize(capacity + kSlack);
+        // NOLINTNEXTLINE(cppcoreguidelines-no-malloc): only realloc leaves pages where they are
+        void* const memory = std::realloc(elements_.get(), (capacity + kSlack) * sizeof(Element));
+        if (memory == nullptr) {
+            throw std::bad_alloc();
+        }
+        (void)elements_.release();
+        elements_.reset(static_cast<Element*>(memory));
         capacity_ = capacity;
     }
 
-    std::vector<Element> elements_;
+    std::unique_ptr<Element, Free> elements_;
     std::size_t size_ = 0;
     std::size_t capacity_ = 0;
 };

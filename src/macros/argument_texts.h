@@ -52,8 +52,7 @@ private:
     bool isBegun_ = false;
 };
 
-/// Adds the arguments of a call as views of its bytes, behind which so many can be read as
-/// `kBytesBehind` says. Returns
+/// Adds the arguments of a call as views of its bytes, behind which eight more can be read. Returns
 /// the end of the call whose "(" is at `open`, or null if that is not told by the bytes before
 /// `end`: the call goes on behind them or over a line end, its arguments are not `count`, or one of
 /// them does not stand as it should.

@@ -38,7 +38,7 @@ struct MacroText {
 /// worked out at its first use.
 class Macro {
 public:
-    /// A zero byte follows it, and behind it so many bytes can be read as `kBytesBehind` says.
+    /// A zero byte follows it, and from each of its bytes eight can be read.
     [[nodiscard]] std::string_view text() const noexcept {
         return {bytes_ + parametersSize_, textSize_};
     }

@@ -9,7 +9,6 @@
 #include <algorithm>
 #include <new>
 
-#include "lex/file_bytes.h"
 #include "lex/page_request.h"
 
 namespace umpre {
@@ -177,11 +176,12 @@ MacroName& MacroTable::newName() {
     return *new (names_.back() + place) MacroName();
 }
 
-// Readers look at many bytes at a time, so as many can be read behind the last.
+// Readers of names look at eight bytes at a time, so that many can be read behind the last.
 char* MacroTable::newBytes(std::size_t size) {
     constexpr std::size_t kBlock = std::size_t{32} * 1024;
-    if (size + kBytesBehind > left_) {
-        left_ = std::max(size + kBytesBehind, kBlock);
+    constexpr std::size_t kReadable = 8;
+    if (size + kReadable > left_) {
+        left_ = std::max(size + kReadable, kBlock);
         free_ = static_cast<char*>(newBlock(left_, 1));
     }
     left_ -= size;

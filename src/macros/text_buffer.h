@@ -8,7 +8,6 @@
 #include <string_view>
 #include <vector>
 
-#include "lex/file_bytes.h"
 #include "lex/growing_array.h"
 
 namespace umpre {
@@ -74,10 +73,11 @@ public:
                    && settled_.front().end == size());
     }
 
-    /// Returns the text. A zero byte follows it, and so many bytes behind it can be read as
-    /// `kBytesBehind` says.
-    [[nodiscard]] std::string_view view() {
-        bytes_.reserveBehind(kBytesBehind);
+    /// Returns the text. A zero byte follows it.
+    [[nodiscard]] std::string_view view() noexcept {
+        if (empty()) {
+            return "";
+        }
         bytes_[size()] = '\0';
         return {bytes_.data(), size()};
     }

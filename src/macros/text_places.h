@@ -20,9 +20,8 @@ enum class PlacesFor {
 };
 
 /// Finds the places in a text where a reader of its tokens has something to look at, many bytes at
-/// a time unless few are left. A place that is none of them may be among them. So many bytes behind
-/// the text can be read as `kBytesBehind` says, and a token begins at each place that it is asked
-/// for.
+/// a time unless few are left. A place that is none of them may be among them. A token begins at
+/// each place that it is asked for.
 template <PlacesFor kFor>
 class TextPlaces {
 public:

@@ -7,8 +7,6 @@
 
 #include <gtest/gtest.h>
 
-#include "lex/file_bytes.h"
-
 namespace umpre {
 namespace {
 
@@ -20,7 +18,7 @@ namespace {
     CallOutline outline;
     std::vector<ArgumentText> arguments;
     // What is behind the end is not to be taken for the end of an argument.
-    const std::string padded = std::string(text) + std::string(kBytesBehind, ')');
+    const std::string padded = std::string(text) + ")       ";
     const char* const end = padded.data() + text.size();
     const char* const behind =
         takeArgumentTexts(padded.data(), end, count, names, outline, arguments);

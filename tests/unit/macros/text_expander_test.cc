@@ -7,7 +7,6 @@
 
 #include <gtest/gtest.h>
 
-#include "lex/file_bytes.h"
 #include "macros/predefined_macros.h"
 
 namespace umpre {
@@ -29,7 +28,7 @@ struct Fixture {
     // Expands what a text begins with: a name, or a name and its arguments. Puts "|" before the
     // rest.
     [[nodiscard]] std::string expanded(std::string_view text) {
-        const std::string all = std::string(text) + std::string(kBytesBehind, ' ');
+        const std::string all = std::string(text) + "        ";
         const std::string name(text.substr(0, text.find('(')));
         const char* const end = all.data() + text.size();
         TextBuffer result;
