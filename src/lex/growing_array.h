@@ -10,6 +10,8 @@
 #include <type_traits>
 #include <utility>
 
+#include "lex/page_request.h"
+
 namespace umpre {
 
 /// An array that grows at its end by several elements at a time, which the caller then writes. What
@@ -37,6 +39,14 @@ public:
     static constexpr std::size_t kSlack = 16 / sizeof(Element);
 
     void clear() noexcept { size_ = 0; }
+
+    /// Takes the memory for `count` elements, all of which will be added.
+    void reserve(std::size_t count) {
+        if (count > capacity_) {
+            setCapacity(count);
+            requestPages(elements_.get(), count * sizeof(Element));
+        }
+    }
 
     /// Takes away all but the first `size` elements.
     void truncate(std::size_t size) noexcept { size_ = size; }
@@ -74,12 +84,16 @@ private:
         std::swap(capacity_, other.capacity_);
     }
 
-    // A large array grows where its pages are: nothing is copied.
     void grow(std::size_t needed) {
         constexpr std::size_t kFirst = 32 / sizeof(Element);
-        const std::size_t capacity = std::max({needed, 2 * capacity_, kFirst});
+        setCapacity(std::max({needed, 2 * capacity_, kFirst}));
+    }
+
+    // A large array grows where its pages are: nothing is copied.
+    void setCapacity(std::size_t capacity) {
+        const std::size_t size = (capacity + kSlack) * sizeof(Element);
         // NOLINTNEXTLINE(cppcoreguidelines-no-malloc): only realloc leaves pages where they are
-        void* const memory = std::realloc(elements_.get(), (capacity + kSlack) * sizeof(Element));
+        void* const memory = std::realloc(elements_.get(), size);
         if (memory == nullptr) {
             throw std::bad_alloc();
         }

@@ -24,6 +24,12 @@ class LexedText {
 public:
     void clear();
 
+    /// Takes the memory for so many tokens and bytes of theirs.
+    void reserve(std::size_t tokens, std::size_t bytes) {
+        tokens_.reserve(tokens);
+        text_.reserve(bytes);
+    }
+
     /// Adds a token of a known kind. `name` is the entry of a name, if it is known.
     void append(TokenKind kind, std::string_view text, Name* name = nullptr);
 

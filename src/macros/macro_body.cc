@@ -278,6 +278,7 @@ std::shared_ptr<const MacroBody> BodyMaker::newBody(const Macro& macro) {
     body->tokens = SharedText::alone();
     const SharedText source = lexer_.lexed(macro.text());
     macros_.enterNames(source.edit());
+    body->tokens.edit().reserve(source->size(), source->joined().size());
     BodyBuilder(macro, *source, *body).build();
     body->isPlain = isPlainText(*source);
     noteTexts(*body);
