@@ -64,8 +64,9 @@ public:
 
     /// Sets who serves included files that are not on the disk.
     void setIncludeResolver(IncludeResolver resolver);
-    /// Sets who is told what the run does.
-    void setObserver(Observer observer);
+    /// Sets who is told what the run does, and of what. Without one, nothing is told, and that
+    /// costs nothing.
+    void setObserver(Observer observer, EventScope scope = EventScope::Files);
 
     /// Preprocesses the source from its beginning to its end.
     [[nodiscard]] Outcome run() const;

@@ -47,6 +47,7 @@ struct Preprocessing::Settings {
     DiagnosticSink diagnostics;
     IncludeResolver resolver;
     Observer observer;
+    EventScope eventScope = EventScope::Files;
 };
 
 Preprocessing::Preprocessing() : settings_(std::make_unique<Settings>()) {}
@@ -90,13 +91,16 @@ void Preprocessing::setIncludeResolver(IncludeResolver resolver) {
     settings_->resolver = std::move(resolver);
 }
 
-void Preprocessing::setObserver(Observer observer) {
+void Preprocessing::setObserver(Observer observer, EventScope scope) {
     settings_->observer = std::move(observer);
+    settings_->eventScope = scope;
 }
 
 Outcome Preprocessing::Settings::run() const {
     SinkBytes output(outputSink);
-    Preprocessor engine(diagnostics);
+    RunOptions options;
+    options.tellsMacros = observer && eventScope == EventScope::FilesAndMacros;
+    Preprocessor engine(diagnostics, options);
     engine.setOutput(output);
     engine.setResolver(resolver);
     engine.setObserver(observer);

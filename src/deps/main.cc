@@ -78,7 +78,7 @@ int preprocess(const umpre::DepsOptions& options, umpre::ByteSink& errors) {
     preprocessor.setObserver([&](const umpre::Event& event) {
         if (event.kind == umpre::Event::Kind::FileEntered) {
             files.add(event.name);
-        } else if (options.absent) {
+        } else if (event.kind == umpre::Event::Kind::FileMissed && options.absent) {
             absent.add(event.name);
         }
     });

@@ -30,7 +30,7 @@ public:
           lexer_(lexer),
           reporter_(reporter),
           evaluator_(sources, macros, reporter),
-          byteTokens_(macros),
+          byteTokens_(macros, sources.tellsMacros()),
           byteEvaluator_(byteTokens_, macros, byteTokens_) {}
 
     /// Tells whether lines are being skipped.

@@ -29,21 +29,35 @@ Preprocessor::Preprocessor(DiagnosticSink diagnostics, const RunOptions& options
     definePredefinedMacros(macros_);
 }
 
+void Preprocessor::setObserver(const Observer& observer) {
+    if (!observer) {
+        return;
+    }
+    events_.emplace(observer, sources_);
+    files_.setObserver([this](const Event& event) { events_->includedFile(event); });
+    if (options_.tellsMacros) {
+        macros_.setEvents(*events_);
+        expander_.setEvents(*events_);
+    }
+}
+
 bool Preprocessor::openSource(const std::string& sourceName, const std::string& messageName) {
     if (!sources_.pushFile(sourceName, messageName)) {
         diagnostics_.reportFatal("cannot open " + sourceName);
         return false;
     }
-    if (observer_) {
-        observer_({Event::Kind::FileEntered, sourceName, {}, 0});
-    }
+    tellSource(sourceName);
     return true;
 }
 
 void Preprocessor::openText(const std::string& sourceName, std::string_view text) {
     sources_.pushFileText(sourceName, text);
-    if (observer_) {
-        observer_({Event::Kind::FileEntered, sourceName, {}, 0});
+    tellSource(sourceName);
+}
+
+void Preprocessor::tellSource(const std::string& name) {
+    if (events_) {
+        events_->sourceEntered(name);
     }
 }
 
@@ -77,6 +91,9 @@ RunResult Preprocessor::readAll() {
         line();
     }
     conditionals_.closeFileGroups();
+    if (events_) {
+        events_->fileLeft();
+    }
     return diagnostics_.errorFlag() ? RunResult::Errors : RunResult::Clean;
 }
 
@@ -128,11 +145,16 @@ DirectiveLine::Outcome Preprocessor::carryOut(DirectiveLine& line) {
                                                : DirectiveLine::Outcome::Untold;
     }
     switch (word) {
-    case KW_INCLUDE: return inclusion_.includeDirective(line);
+    case KW_INCLUDE: return carryOutInclude(line);
     case KW_DEFINE: files_.noteAction(); return definitions_.defineDirective(line);
     case KW_UNDEF: files_.noteAction(); return definitions_.undefDirective(line);
     default: return DirectiveLine::Outcome::Untold;
     }
+}
+
+DirectiveLine::Outcome Preprocessor::carryOutInclude(DirectiveLine& line) {
+    const EventTeller::Directive told(events_);
+    return inclusion_.includeDirective(line);
 }
 
 DirectiveLine::Outcome Preprocessor::carryOutConditional(DirectiveLine& line) {
@@ -165,6 +187,7 @@ void Preprocessor::line() {
 
 // A word that stands for no conditional directive is looked at in active text only.
 void Preprocessor::directiveLine() {
+    const EventTeller::Directive told(events_);
     if (!conditionals_.skipping()) {
         files_.noteAction();
     }
@@ -266,6 +289,9 @@ void Preprocessor::fileEnds() {
 }
 
 void Preprocessor::fileResumed() {
+    if (events_) {
+        events_->fileLeft();
+    }
     output_.writeLineMarker(sources_.position());
 }
 

@@ -2,6 +2,7 @@
 #ifndef UMPRE_DRIVER_PREPROCESSOR_H
 #define UMPRE_DRIVER_PREPROCESSOR_H
 
+#include <optional>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -13,6 +14,7 @@
 #include "directives/line_control.h"
 #include "directives/line_skipper.h"
 #include "driver/diagnostics.h"
+#include "driver/event_teller.h"
 #include "lex/byte_sink.h"
 #include "lex/directive_line.h"
 #include "lex/name_reader.h"
@@ -53,11 +55,8 @@ public:
     /// Asks before an included file is looked for on the disk.
     void setResolver(IncludeResolver resolver) { files_.setResolver(std::move(resolver)); }
 
-    /// Tells what the run does.
-    void setObserver(const Observer& observer) {
-        observer_ = observer;
-        files_.setObserver(observer);
-    }
+    /// Tells what the run does, if somebody is given; of macros only if the options say so.
+    void setObserver(const Observer& observer);
 
     /// Sets where the output goes; must be called before a source is opened.
     void setOutput(ByteSink& output) { output_.redirect(output); }
@@ -81,10 +80,12 @@ private:
     void fileResumed() override;
     [[nodiscard]] Outcome readName(std::string_view name, const char* end) override;
 
+    void tellSource(const std::string& name);
     [[nodiscard]] RunResult readAll();
     [[nodiscard]] bool readBytes();
     [[nodiscard]] bool readDirective(CppFileScanner& file);
     [[nodiscard]] DirectiveLine::Outcome carryOut(DirectiveLine& line);
+    [[nodiscard]] DirectiveLine::Outcome carryOutInclude(DirectiveLine& line);
     [[nodiscard]] DirectiveLine::Outcome carryOutConditional(DirectiveLine& line);
     [[nodiscard]] CppFileScanner* byteSource();
     void line();
@@ -96,7 +97,7 @@ private:
     void endSkippedLine();
 
     RunOptions options_;
-    Observer observer_;
+    std::optional<EventTeller> events_;
     OutputWriter output_;
     TextLexer lexer_;  // its texts are held by sources and macros
     ScannerStack sources_;

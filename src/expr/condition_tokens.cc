@@ -25,10 +25,6 @@ namespace {
 
 using enum TokenKind;
 
-// Deeper nesting is left to the token road, which has a quicker way to know the names around a
-// text.
-constexpr std::size_t kDeepest = 16;
-
 }  // namespace
 
 void ConditionTokens::read(DirectiveLine& line, bool watchesNames) {
@@ -112,7 +108,7 @@ bool ConditionTokens::beginReplacement(std::string_view name) {
     if (macro == nullptr || std::any_of(replacements_.begin(), replacements_.end(), isOf)) {
         return false;
     }
-    if (macro->macro.functionLike() || isRefreshed(*macro) || replacements_.size() == kDeepest) {
+    if (macro->macro.functionLike() || isRefreshed(*macro) || replacements_.size() == deepest_) {
         isTold_ = false;
         return true;
     }

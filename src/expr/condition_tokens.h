@@ -18,7 +18,9 @@ namespace umpre {
 /// line. It is a reporter, too: what would have to be reported is for the scanner to find.
 class ConditionTokens final : public Reporter {
 public:
-    explicit ConditionTokens(MacroTable& macros) noexcept : macros_(macros) {}
+    /// Where each macro must be expanded by itself, none is here.
+    explicit ConditionTokens(MacroTable& macros, bool tellsMacros = false) noexcept
+        : macros_(macros), deepest_(tellsMacros ? 0 : kDeepest) {}
 
     /// Begins to read a line where its reading stands. The line is borrowed. The names met are
     /// watched, or not.
@@ -65,12 +67,17 @@ private:
     // What the tokens behind `defined` are.
     enum class Expected { Anything, Operand, ParenthesizedOperand };
 
+    // Deeper nesting is left to the token road, which has a quicker way to know the names around a
+    // text.
+    static constexpr std::size_t kDeepest = 16;
+
     void scan();
     [[nodiscard]] Token scanUnexpanded();
     [[nodiscard]] bool isProtected(TokenKind kind);
     [[nodiscard]] bool beginReplacement(std::string_view name);
 
     MacroTable& macros_;
+    std::size_t deepest_;  // nesting of texts
     DirectiveLine* line_ = nullptr;
     std::vector<Replacement> replacements_;  // the innermost one is the last
     Token peeked_;         // comes next if `hasPeek_`, otherwise it was the last one

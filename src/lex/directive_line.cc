@@ -72,7 +72,9 @@ DirectiveLine::DirectiveLine(CppFileScanner& file) : file_(file) {
     if (begin_ == limit_) {
         return;
     }
-    skipBlanks();
+    if (skipBlanks() && !isOneLine()) {
+        return;
+    }
     if (next().kind == TokenKind::HASH) {
         skipBlanks();
         const TokenKind kind = next().kind;

@@ -29,7 +29,8 @@ public:
     };
 
     /// Returns the kind of the directive's word, a name; END_OF_INPUT if the line has none, or is
-    /// not whole in memory.
+    /// not whole in memory, or has a continuation before the "#", which is then not on the line
+    /// that the file stands on.
     [[nodiscard]] TokenKind word() const noexcept { return word_; }
 
     /// Returns the byte that comes next.

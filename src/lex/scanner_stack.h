@@ -119,6 +119,12 @@ public:
     /// Tells whether every token must be read by itself.
     [[nodiscard]] bool plainRoad() const noexcept { return options_.plainRoad; }
 
+    /// Tells whether each macro must be expanded by itself.
+    [[nodiscard]] bool tellsMacros() const noexcept { return options_.tellsMacros; }
+
+    /// Tells whether the token read last came straight from a file.
+    [[nodiscard]] bool readsFile() const noexcept { return sources_.back().isFile; }
+
     /// Leaves the current file, as reading on would, if it is an included one and read to its end.
     /// Returns whether it was. The token behind is not looked at.
     bool leaveEndedFile();

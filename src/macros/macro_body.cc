@@ -280,7 +280,7 @@ std::shared_ptr<const MacroBody> BodyMaker::newBody(const Macro& macro) {
     macros_.enterNames(source.edit());
     body->tokens.edit().reserve(source->size(), source->joined().size());
     BodyBuilder(macro, *source, *body).build();
-    body->isPlain = isPlainText(*source);
+    body->isPlain = !tellsMacros_ && isPlainText(*source);
     noteTexts(*body);
     if (source->hasEffects()) {
         body->source = source;

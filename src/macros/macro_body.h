@@ -58,7 +58,7 @@ struct MacroBody {
     std::vector<BodyStep> steps;
     std::vector<BodyOperand> operands;
     std::vector<const Name*> names;  // of the tokens that stay as they are
-    /// Replacing is a matter of the bytes of this body and the arguments.
+    /// Replacing is a matter of the bytes of this body and the arguments alone.
     bool isPlain = false;
     // Whether `names` holds one of a macro, as of so many changes of the table.
     mutable bool hasMacros = false;
@@ -68,7 +68,12 @@ struct MacroBody {
 /// Makes bodies.
 class BodyMaker {
 public:
-    BodyMaker(TextLexer& lexer, MacroTable& macros) noexcept : lexer_(lexer), macros_(macros) {}
+    /// Where each macro must be expanded by itself, no body is plain.
+    BodyMaker(TextLexer& lexer, MacroTable& macros, bool tellsMacros = false) noexcept
+        : lexer_(lexer), macros_(macros), tellsMacros_(tellsMacros) {}
+
+    /// Tells whether each macro must be expanded by itself.
+    [[nodiscard]] bool tellsMacros() const noexcept { return tellsMacros_; }
 
     /// Returns the tokens of an object-like macro. They are kept from the second use on: of many
     /// macros that name each other each is often used once.
@@ -96,6 +101,7 @@ private:
 
     TextLexer& lexer_;
     MacroTable& macros_;
+    bool tellsMacros_;
     // A name that is defined anew is often given one of few definitions in turn.
     std::array<KeptBody, 64> kept_;
 };

@@ -84,7 +84,20 @@ MacroExpander::Outcome MacroExpander::lookAt(MacroName* name) {
     if (mayBeRefreshed(*name)) {
         refresh(*name);
     }
-    return name->macro.functionLike() ? beginInvocation(*name) : replaceObject(*name);
+    return events_ == nullptr ? replace(*name) : replaceAndTell(*name);
+}
+
+MacroExpander::Outcome MacroExpander::replace(const MacroName& name) {
+    return name.macro.functionLike() ? beginInvocation(name) : replaceObject(name);
+}
+
+MacroExpander::Outcome MacroExpander::replaceAndTell(const MacroName& name) {
+    events_->macroMet();
+    const Outcome outcome = replace(name);
+    if (outcome != Outcome::Uncalled && outcome != Outcome::Abandoned) {
+        events_->macroExpanded(name.text);
+    }
+    return outcome;
 }
 
 MacroName* MacroExpander::entryOf(const Token& token) {

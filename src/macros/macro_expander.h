@@ -19,6 +19,7 @@
 #include "macros/arguments.h"
 #include "macros/expansion_memo.h"
 #include "macros/macro_body.h"
+#include "macros/macro_events.h"
 #include "macros/macro_table.h"
 #include "macros/substitution.h"
 #include "macros/text_buffer.h"
@@ -41,11 +42,14 @@ public:
           macros_(macros),
           reporter_(reporter),
           lexer_(lexer),
-          bodies_(lexer, macros),
+          bodies_(lexer, macros, sources.tellsMacros()),
           texts_(macros, bodies_),
           memo_(macros, texts_),
           collector_(sources, macros, reporter, lexer.texts()),
           substitution_(sources, macros, reporter, lexer, sets_) {}
+
+    /// Tells of each macro that is replaced by tokens.
+    void setEvents(MacroEvents& events) noexcept { events_ = &events; }
 
     /// Reads a name in a file's text, as bytes.
     [[nodiscard]] NameReader::Outcome readName(std::string_view name, const char* end);
@@ -76,6 +80,8 @@ private:
     [[nodiscard]] MacroName* entryOf(const Token& token);
     [[nodiscard]] Outcome lookAt(MacroName* name);
     void refresh(MacroName& name);
+    [[nodiscard]] Outcome replace(const MacroName& name);
+    [[nodiscard]] Outcome replaceAndTell(const MacroName& name);
     [[nodiscard]] Outcome replaceObject(const MacroName& name);
     [[nodiscard]] bool isText(const LexedText& text) const;
     [[nodiscard]] Outcome beginInvocation(const MacroName& name);
@@ -102,6 +108,7 @@ private:
     ExpansionMemo memo_;
     ArgumentCollector collector_;
     Substitution substitution_;
+    MacroEvents* events_ = nullptr;
     LineKind lineKind_ = LineKind::Operand;
     std::vector<std::unique_ptr<Invocation>> invocations_;  // the innermost one is the last
     std::vector<std::unique_ptr<Invocation>> spare_;        // finished, to be used again

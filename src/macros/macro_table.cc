@@ -66,6 +66,7 @@ void MacroTable::defineMacro(std::string_view name, std::string_view text) {
     if (!entry.isDefined) {
         noteChange(name);
         replace(entry, {text, {}, false});
+        tellDefined(entry);
     }
 }
 
@@ -77,6 +78,7 @@ MacroTable::Definition MacroTable::define(std::string_view name, const MacroText
     }
     noteChange(name);
     replace(entry, definition);
+    tellDefined(entry);
     return isAdded ? Definition::Added : Definition::Replaced;
 }
 
@@ -123,6 +125,25 @@ void MacroTable::undefine(std::string_view name) {
         entry->isDefined = false;
         ++changes_;
         dropUse(entry->macro);
+        if (events_ != nullptr) {
+            events_->macroUndefined(entry->text);
+        }
+    }
+}
+
+void MacroTable::setEvents(MacroEvents& events) {
+    events_ = &events;
+    for (std::uint32_t number = 1; number <= nameCount_; ++number) {
+        const MacroName& name = nameIn({0, number});
+        if (name.isDefined) {
+            tellDefined(name);
+        }
+    }
+}
+
+void MacroTable::tellDefined(const MacroName& name) {
+    if (events_ != nullptr) {
+        events_->macroDefined(name.text);
     }
 }
 

@@ -12,6 +12,7 @@
 #include "lex/lexed_text.h"
 #include "lex/name_filter.h"
 #include "macros/macro.h"
+#include "macros/macro_events.h"
 
 namespace umpre {
 
@@ -78,6 +79,10 @@ public:
         }
     }
 
+    /// Tells of each definition that there is, and from now on of each that is made, replaced or
+    /// removed.
+    void setEvents(MacroEvents& events);
+
     /// Returns a number, not 0, that stays the same while the watched names keep their definitions.
     /// With another version, no names are watched at first.
     [[nodiscard]] std::uint64_t version() const noexcept { return version_; }
@@ -110,6 +115,7 @@ private:
     static void dropUse(const Macro& macro) noexcept;
     void addToFilter(const Name& name);
     void noteChange(std::string_view name);
+    void tellDefined(const MacroName& name);
     void grow();
 
     std::pmr::monotonic_buffer_resource bytes_;  // of names and definitions
@@ -124,6 +130,7 @@ private:
     NameFilter watched_;  // by readers of definitions
     std::uint64_t version_ = 1;
     std::uint64_t changes_ = 1;
+    MacroEvents* events_ = nullptr;
     std::deque<Name> unknown_;  // the last one stands for what was never defined
     bool unknownIsNoted_ = false;
 };

@@ -2,6 +2,7 @@
 #include "macros/predefined_macros.h"
 
 #include <array>
+#include <cstring>
 #include <ctime>
 #include <string>
 #include <string_view>
@@ -40,7 +41,11 @@ void definePredefinedMacros(MacroTable& macros) {
 }
 
 bool isRefreshed(const MacroName& name) noexcept {
-    return mayBeRefreshed(name) && (name.text == kFile || name.text == kLine);
+    // Of a size that is known, bytes are compared all at once.
+    const auto is = [&name](std::string_view other) {
+        return std::memcmp(name.text.data(), other.data(), kFile.size()) == 0;
+    };
+    return mayBeRefreshed(name) && (is(kFile) || is(kLine));
 }
 
 void refreshPredefined(MacroTable& macros, MacroName& name, const SourcePosition& position) {

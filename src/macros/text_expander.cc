@@ -45,6 +45,9 @@ const std::vector<TextBuffer::Part> kNoParts;
 }  // namespace
 
 bool TextExpander::expandObject(const MacroName& name, TextBuffer& to) {
+    if (bodies_.tellsMacros()) {
+        return false;
+    }
     watches_ = true;
     macros_.watch(name.text);
     // The text around ends with the name.

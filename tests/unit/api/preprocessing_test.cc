@@ -10,6 +10,7 @@
 
 #include <gtest/gtest.h>
 
+#include "support/event_list.h"
 #include "support/temporary_directory.h"
 #include "umpre/version.h"
 
@@ -186,23 +187,29 @@ TEST(Preprocessing, AsksForIncludedFiles) {
     EXPECT_EQ(asked, (std::vector<std::string>{"a.inc", "one/a.inc", "two/a.inc", onDisk}));
 }
 
-TEST(Preprocessing, TellsWhichFilesAreEnteredAndMissed) {
+TEST(Preprocessing, TellsWhichFilesAreEnteredMissedAndLeft) {
     Fixture f;
     f.preprocessing.addIncludeDirectory("one");
     f.preprocessing.setIncludeResolver([](std::string_view name) -> IncludeAnswer {
-        return {name == "one/a" ? IncludeAnswer::Kind::Text : IncludeAnswer::Kind::Absent, {}};
+        return {name == "one/a" ? IncludeAnswer::Kind::Text : IncludeAnswer::Kind::Absent, "A\n"};
     });
-    std::string told;
-    f.preprocessing.setObserver([&told](const Event& event) {
-        told.append(event.kind == Event::Kind::FileEntered ? "+" : "-").append(event.name);
-        told.append("@")
-            .append(event.file)
-            .append(":")
-            .append(std::to_string(event.line))
-            .append(" ");
-    });
+    testing::EventList events;
+    f.preprocessing.define("A");
+    f.preprocessing.setObserver(events.observer());
     EXPECT_EQ(f.run("#include \"a\"\n"), Outcome::Clean);
-    EXPECT_EQ(told, "+main@:0 -a@main:2 +one/a@main:2 ");
+    EXPECT_EQ(events.text(),
+              "enter main; miss a main:1; enter one/a main:1; leave one/a main:2; leave main; ");
+}
+
+TEST(Preprocessing, TellsWhatBecomesOfMacrosIfAskedTo) {
+    Fixture f;
+    testing::EventList events;
+    f.preprocessing.define("A");
+    f.preprocessing.setObserver(events.observer(), EventScope::FilesAndMacros);
+    EXPECT_EQ(f.run("A\n#undef A\n#define B\n"), Outcome::Clean);
+    EXPECT_EQ(events.text(),
+              "define __FILE__; define __LINE__; define __DATE__; define __TIME__; define A; "
+              "enter main; expand A main:1; undefine A main:2; define B main:3; leave main; ");
 }
 
 TEST(Preprocessing, NeedsNoSinks) {

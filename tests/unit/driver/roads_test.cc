@@ -1,7 +1,7 @@
 // SPDX-License-Identifier: MIT
 //
 // A run may copy and skip text as bytes or read all of it as tokens, and it may hold much or little
-// of its input at a time. Whichever road it takes, the same must come out.
+// of its input at a time. Whichever road it takes, the same must come out, and the same be told.
 #include <array>
 #include <cstddef>
 #include <cstdint>
@@ -9,11 +9,13 @@
 #include <random>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include <gtest/gtest.h>
 
 #include "driver/preprocessor.h"
+#include "support/event_list.h"
 #include "support/recording_sink.h"
 #include "support/temporary_directory.h"
 
@@ -84,10 +86,39 @@ struct Run {
     return run.outcome();
 }
 
+// What a run gives, and what it tells an observer.
+using ObservedOutcome = std::pair<Outcome, std::string>;
+
+[[nodiscard]] ObservedOutcome observedOutcome(std::string_view text, const RunOptions& options) {
+    testing::EventList events;
+    Run run(options);
+    run.preprocessor.setObserver(events.observer());
+    run.preprocessor.openText("main", text);
+    const Outcome outcome = run.outcome();
+    return {outcome, events.text()};
+}
+
+void expectSameEvents(std::string_view text, const Outcome& expected) {
+    for (const bool tellsMacros : {true, false}) {
+        const ObservedOutcome plain =
+            observedOutcome(text, {.plainRoad = true, .tellsMacros = tellsMacros});
+        EXPECT_EQ(plain.first, expected) << ::testing::PrintToString(text) << ", observed";
+        for (const std::size_t windowSize : {kWindowSizes.front(), kWindowSizes.back()}) {
+            const ObservedOutcome observed =
+                observedOutcome(text, {.windowSize = windowSize,
+                                       .settlingTime = RunOptions::kAlwaysSettled,
+                                       .tellsMacros = tellsMacros});
+            EXPECT_EQ(observed, plain) << ::testing::PrintToString(text) << ", macros told "
+                                       << tellsMacros << ", window " << windowSize;
+        }
+    }
+}
+
 void expectSameOnAllRoads(std::string_view text) {
     const testing::TemporaryDirectory directory;
     const std::string fileName = directory.write("main", text);
     const Outcome expected = plainOutcome(text);
+    expectSameEvents(text, expected);
     for (const bool plainRoad : {true, false}) {
         for (const std::size_t windowSize : kWindowSizes) {
             const RunOptions options{plainRoad, windowSize, RunOptions::kAlwaysSettled};

@@ -129,6 +129,15 @@ TEST_F(ConditionTokensTest, DoNotTellWhatTheyDoNotKnow) {
     EXPECT_EQ(tokensOf("D15"), "0");
 }
 
+TEST_F(ConditionTokensTest, ExpandNothingWhereEachMacroIsToldOf) {
+    file.openText("main", "#if N\n");
+    DirectiveLine line(file);
+    ConditionTokens observed(macros, true);
+    observed.read(line);
+    EXPECT_EQ(observed.next().kind, END_OF_INPUT);
+    EXPECT_FALSE(observed.isTold());
+}
+
 TEST_F(ConditionTokensTest, AreEvaluated) {
     EXPECT_EQ(valueOf("N > 2 && !defined(M) || SUM == 8"), "1");
     EXPECT_EQ(valueOf("(SUM << 2) ? -MINUS : 5"), "1");

@@ -38,7 +38,7 @@ struct DirectiveLineTest : ::testing::Test {
 TEST_F(DirectiveLineTest, KnowsItsWord) {
     for (const std::string_view text :
          {"#define\n", " \t#\v\fdefine x\n", "#/* a */define\n", "/* a */ # define\n",
-          "\\\n#\\\ndefine(\n", "#define\"\n", "#define/\n"}) {
+          "#\\\ndefine(\n", "#define\"\n", "#define/\n"}) {
         EXPECT_EQ(lineOf(text).word(), KW_DEFINE) << text;
     }
     EXPECT_EQ(lineOf("#definex\n").word(), IDENTIFIER);
@@ -49,7 +49,7 @@ TEST_F(DirectiveLineTest, HasNoWordWhereThereIsNoDirective) {
     for (const std::string_view text :
          {"", "\n", "x\n", "#\n", "# 1\n", "##define\n", "#\"\"\n", "#defined\n", "//#define\n",
           "/* a\n*/ #define\n", "#/* a\n*/define\n", "\r#define\n", "#\rdefine\n",
-          "#\\\r\ndefine\n", "#define", "#\\\n"}) {
+          "#\\\r\ndefine\n", "\\\n#define\n", "#define", "#\\\n"}) {
         EXPECT_EQ(lineOf(text).word(), END_OF_INPUT) << text;
     }
 }

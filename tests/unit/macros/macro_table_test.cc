@@ -218,5 +218,38 @@ TEST(MacroTable, TheFilterStopsNamesNeverDefined) {
     EXPECT_FALSE(macros.filter().mayHold("anything"));
 }
 
+// Writes what it is told.
+class RecordingMacroEvents final : public MacroEvents {
+public:
+    void macroDefined(std::string_view name) override { told.append("+").append(name); }
+
+    void macroUndefined(std::string_view name) override { told.append("-").append(name); }
+
+    void macroMet() override { told.append("?"); }
+
+    void macroExpanded(std::string_view name) override { told.append("!").append(name); }
+
+    std::string told;
+};
+
+TEST(MacroTable, TellsOfChangesOfDefinitions) {
+    MacroTable macros;
+    macros.defineMacro("A", "");
+    macros.defineMacro("B", "");
+    macros.undefine("B");
+    RecordingMacroEvents events;
+    macros.setEvents(events);
+    EXPECT_EQ(events.told, "+A");
+    events.told.clear();
+    macros.defineMacro("A", "1");
+    macros.define("A", {"", {}, false});
+    macros.undefine("B");
+    EXPECT_EQ(events.told, "");
+    macros.define("A", {"1", {}, false});
+    macros.define("B", {"1", {}, false});
+    macros.undefine("B");
+    EXPECT_EQ(events.told, "+A+B-B");
+}
+
 }  // namespace
 }  // namespace umpre

@@ -230,5 +230,18 @@ TEST(TextExpander, TakesNoMoreOfATextThanItIsGiven) {
     EXPECT_EQ(f.expanded("P(F)"), kNotTold);  // behind the F of before was more in memory
 }
 
+TEST(TextExpander, TellsNothingWhereEachMacroIsToldOf) {
+    Fixture f;
+    f.define("N", "3");
+    f.define("F", "x", "x");
+    BodyMaker bodies(f.lexer, f.macros, true);
+    TextExpander expander(f.macros, bodies);
+    const std::string call = "(1)        ";
+    TextBuffer result;
+    EXPECT_FALSE(expander.expandObject(*f.macros.find("N"), result));
+    EXPECT_EQ(expander.expandCall(*f.macros.find("F"), call.data(), call.data() + 3, result),
+              nullptr);
+}
+
 }  // namespace
 }  // namespace umpre
