@@ -28,10 +28,14 @@ using enum TokenKind;
 
 NameReader::Outcome MacroExpander::readName(std::string_view name, const char* end) {
     const char* const behind = name.data() + name.size();
-    const MacroName* const macro = macros_.find(name);
-    if (macro == nullptr) {
-        return {name, behind};
+    // Lists call one macro again and again.
+    if (lastRead_ == nullptr || lastRead_->text != name || !lastRead_->isDefined) {
+        lastRead_ = macros_.find(name);
+        if (lastRead_ == nullptr) {
+            return {name, behind};
+        }
     }
+    const MacroName* const macro = lastRead_;
     if (macro->macro.functionLike()) {
         call_.clear();
         const char* const callEnd = texts_.expandCall(*macro, behind, end, call_);

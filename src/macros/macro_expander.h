@@ -117,6 +117,7 @@ private:
     std::string skipped_;
     std::string written_;
     TextBuffer call_;
+    const MacroName* lastRead_ = nullptr;
     SharedText text_;
 };
 
