@@ -2,8 +2,11 @@
 #ifndef UMPRE_PREPROCESSING_H
 #define UMPRE_PREPROCESSING_H
 
+#include <cstddef>
 #include <functional>
+#include <iosfwd>
 #include <memory>
+#include <optional>
 #include <string_view>
 
 #include "umpre/diagnostic.h"
@@ -27,6 +30,11 @@ enum class Outcome {
 /// throw, and it must not use the Preprocessing that runs.
 using OutputSink = std::function<bool(std::string_view bytes)>;
 
+/// Brings bytes of the source: up to `size` of them, which is not 0, to `to`. Returns how many, 0
+/// at the end, or nothing if reading fails. It may bring fewer than there is room for, but the run
+/// waits for each call. It must not throw, and it must not use the Preprocessing that runs.
+using SourceReader = std::function<std::optional<std::size_t>(char* to, std::size_t size)>;
+
 /// What is to be preprocessed, how, and where the result goes.
 ///
 /// An object can run any number of times. It keeps no state from run to run and shares none with
@@ -48,6 +56,17 @@ public:
     void setSourceFile(std::string_view fileName);
     /// Reads the source from a text, of which a copy is kept, under this name.
     void setSourceText(std::string_view name, std::string_view text);
+    /// Reads the source, which has this name, from whoever brings it, in pieces of some 64 KiB,
+    /// none of which is asked for before it is needed. The reader is kept until another source is
+    /// set. A run asks it until it says that the end is reached, and not again; what it brings to a
+    /// next run is up to it. If it fails, or says that it brought more than there was room for, the
+    /// run ends with Outcome::InputFailed.
+    void setSourceReader(std::string_view name, SourceReader reader);
+    /// Reads the source, which has this name, from where a stream stands to its end, in the same
+    /// way. The stream is borrowed: it must outlive all runs, and belongs to the run that goes on.
+    /// To run again, clear and rewind it before. It fails with `bad()`, or with `fail()` before its
+    /// end.
+    void setSourceStream(std::string_view name, std::istream& stream);
     /// Names the source in messages, line markers and `__FILE__`, unless `name` is empty.
     void setMessageName(std::string_view name);
 

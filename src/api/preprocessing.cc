@@ -1,13 +1,16 @@
 // SPDX-License-Identifier: MIT
 #include "umpre/preprocessing.h"
 
+#include <istream>
 #include <new>
+#include <optional>
 #include <string>
 #include <utility>
 #include <vector>
 
 #include "driver/preprocessor.h"
 #include "lex/byte_sink.h"
+#include "lex/byte_source.h"
 #include "lex/scanner_failure.h"
 #include "umpre/version.h"
 
@@ -25,6 +28,32 @@ private:
     const OutputSink& sink_;
 };
 
+// Brings what a reader brings.
+class ReaderBytes final : public ByteSource {
+public:
+    explicit ReaderBytes(const SourceReader& reader) noexcept : reader_(reader) {}
+
+    [[nodiscard]] std::optional<std::size_t> read(char* to, std::size_t size) override {
+        return reader_ ? reader_(to, size) : 0;
+    }
+
+private:
+    const SourceReader& reader_;
+};
+
+// Reads from a stream, which may be one that throws; its state tells the same.
+std::optional<std::size_t> readFrom(std::istream& stream, char* to, std::size_t size) {
+    try {
+        stream.read(to, static_cast<std::streamsize>(size));
+    } catch (...) {
+        // The state tells.
+    }
+    if (stream.bad() || (stream.fail() && !stream.eof())) {
+        return std::nullopt;
+    }
+    return static_cast<std::size_t>(stream.gcount());
+}
+
 struct Definition {
     std::string name;
     std::string text;
@@ -33,13 +62,23 @@ struct Definition {
 }  // namespace
 
 struct Preprocessing::Settings {
-    enum class Kind { File, Text };
+    enum class Kind { File, Text, Reader };
 
+    // Lets go of the source before.
+    void setSource(Kind newKind, std::string_view name) {
+        kind = newKind;
+        sourceName = name;
+        sourceText.clear();
+        sourceReader = nullptr;
+    }
+
+    [[nodiscard]] bool open(Preprocessor& engine, ByteSource& reader) const;
     [[nodiscard]] Outcome run() const;
 
     Kind kind = Kind::Text;
     std::string sourceName;
     std::string sourceText;
+    SourceReader sourceReader;
     std::string messageName;
     std::vector<Definition> definitions;
     std::vector<std::string> includeDirectories;
@@ -57,14 +96,22 @@ Preprocessing& Preprocessing::operator=(Preprocessing&& other) noexcept = defaul
 Preprocessing::~Preprocessing() = default;
 
 void Preprocessing::setSourceFile(std::string_view fileName) {
-    settings_->kind = Settings::Kind::File;
-    settings_->sourceName = fileName;
+    settings_->setSource(Settings::Kind::File, fileName);
 }
 
 void Preprocessing::setSourceText(std::string_view name, std::string_view text) {
-    settings_->kind = Settings::Kind::Text;
-    settings_->sourceName = name;
+    settings_->setSource(Settings::Kind::Text, name);
     settings_->sourceText = text;
+}
+
+void Preprocessing::setSourceReader(std::string_view name, SourceReader reader) {
+    settings_->setSource(Settings::Kind::Reader, name);
+    settings_->sourceReader = std::move(reader);
+}
+
+void Preprocessing::setSourceStream(std::string_view name, std::istream& stream) {
+    setSourceReader(name,
+                    [&stream](char* to, std::size_t size) { return readFrom(stream, to, size); });
 }
 
 void Preprocessing::setMessageName(std::string_view name) {
@@ -96,6 +143,16 @@ void Preprocessing::setObserver(Observer observer, EventScope scope) {
     settings_->eventScope = scope;
 }
 
+bool Preprocessing::Settings::open(Preprocessor& engine, ByteSource& reader) const {
+    const std::string& name = messageName.empty() ? sourceName : messageName;
+    switch (kind) {
+    case Kind::File: return engine.openSource(sourceName, messageName);
+    case Kind::Text: engine.openText(name, sourceText); return true;
+    case Kind::Reader: engine.openBytes(name, reader); return true;
+    }
+    return false;
+}
+
 Outcome Preprocessing::Settings::run() const {
     SinkBytes output(outputSink);
     RunOptions options;
@@ -110,9 +167,8 @@ Outcome Preprocessing::Settings::run() const {
     for (const std::string& directory : includeDirectories) {
         engine.addIncludeDirectory(directory);
     }
-    if (kind == Settings::Kind::Text) {
-        engine.openText(messageName.empty() ? sourceName : messageName, sourceText);
-    } else if (!engine.openSource(sourceName, messageName)) {
+    ReaderBytes reader(sourceReader);
+    if (!open(engine, reader)) {
         return Outcome::SourceNotOpened;
     }
     switch (engine.run()) {

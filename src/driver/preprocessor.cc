@@ -50,6 +50,11 @@ bool Preprocessor::openSource(const std::string& sourceName, const std::string& 
     return true;
 }
 
+void Preprocessor::openBytes(const std::string& sourceName, ByteSource& source) {
+    sources_.pushFileSource(sourceName, source);
+    tellSource(sourceName);
+}
+
 void Preprocessor::openText(const std::string& sourceName, std::string_view text) {
     sources_.pushFileText(sourceName, text);
     tellSource(sourceName);

@@ -65,6 +65,8 @@ public:
     /// messages and markers it has the message name, unless that is empty. Returns false after
     /// reporting that it cannot be opened.
     [[nodiscard]] bool openSource(const std::string& sourceName, const std::string& messageName);
+    /// Reads what somebody else brings as the source.
+    void openBytes(const std::string& sourceName, ByteSource& source);
     /// Reads a text as the source.
     void openText(const std::string& sourceName, std::string_view text);
 

@@ -22,6 +22,12 @@ bool CppFileScanner::open(const std::string& fileName) {
     return true;
 }
 
+void CppFileScanner::openSource(const std::string& fileName, ByteSource& source) {
+    setFileName(fileName);
+    input_.openSource(source);
+    start();
+}
+
 void CppFileScanner::openText(const std::string& fileName, std::string_view text) {
     setFileName(fileName);
     input_.openText(text);

@@ -29,6 +29,8 @@ public:
     /// Opens a file, or standard input, called "stdin", if the name is empty. Returns false if it
     /// cannot be opened; the scanner must then not be read.
     [[nodiscard]] bool open(const std::string& fileName);
+    /// Reads what somebody else brings as if it were the file of that name.
+    void openSource(const std::string& fileName, ByteSource& source);
     /// Reads a text as if it were the file of that name.
     void openText(const std::string& fileName, std::string_view text);
     /// Reads the bytes of a regular file that were kept, without opening it.

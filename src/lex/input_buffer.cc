@@ -80,6 +80,11 @@ void InputBuffer::openBorrowed(int descriptor) {
     ended_ = false;
 }
 
+void InputBuffer::openSource(ByteSource& source) {
+    openBorrowed(-1);
+    source_ = &source;
+}
+
 void InputBuffer::openText(std::string_view text) {
     close();
     reserve(text.size());
@@ -138,6 +143,7 @@ void InputBuffer::reset() {
     filled_ = 0;
     limit_ = 0;
     descriptor_ = -1;
+    source_ = nullptr;
     owned_ = false;
     ended_ = true;
     readAtOnce_ = false;
@@ -215,19 +221,33 @@ void InputBuffer::readOnce() {
     if (sizeKnown_) {
         room = static_cast<std::size_t>(std::min<std::uint64_t>(unread_, room));
     }
-    ssize_t count = 0;
-    do {
-        count = room == 0 ? 0 : ::read(descriptor_, end(), room);
-    } while (count < 0 && errno == EINTR);
-    if (count < 0) {
-        throw ScannerFailure{"input in flex scanner failed"};
-    }
-    filled_ += static_cast<std::size_t>(count);
+    const std::size_t count = room == 0 ? 0 : readBytes(room);
+    filled_ += count;
     waits_ += mayWait_ ? 1 : 0;
     if (sizeKnown_) {
-        unread_ -= static_cast<std::uint64_t>(count);
+        unread_ -= count;
     }
     ended_ = count == 0 || (sizeKnown_ && unread_ == 0);
+}
+
+// Returns how many bytes have come; 0 at the end.
+std::size_t InputBuffer::readBytes(std::size_t room) {
+    std::optional<std::size_t> count;
+    if (source_ != nullptr) {
+        count = source_->read(end(), room);
+    } else {
+        ssize_t read = 0;
+        do {
+            read = ::read(descriptor_, end(), room);
+        } while (read < 0 && errno == EINTR);
+        if (read >= 0) {
+            count = static_cast<std::size_t>(read);
+        }
+    }
+    if (!count || *count > room) {
+        throw ScannerFailure{"input in flex scanner failed"};
+    }
+    return *count;
 }
 
 void InputBuffer::terminate() {

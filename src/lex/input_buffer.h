@@ -9,18 +9,19 @@
 #include <string_view>
 #include <utility>
 
+#include "lex/byte_source.h"
 #include "lex/file_bytes.h"
 #include "lex/file_identity.h"
 #include "lex/run_options.h"
 
 namespace umpre {
 
-/// The bytes of a file, of standard input or of a text, in windows. A window can be scanned up to
-/// `limit()`, where a token begins: behind the last line end, or within a line that is longer than
-/// the window. Of the tokens in front of it only comments and literals may reach across; bytes
-/// behind it may already be there. Two zero bytes follow the end, as the generated scanner wants
-/// them, and readers of several bytes at a time may read 64 bytes behind it and 8 before the
-/// beginning.
+/// The bytes of a file, of standard input, of somebody else or of a text, in windows. A window can
+/// be scanned up to `limit()`, where a token begins: behind the last line end, or within a line
+/// that is longer than the window. Of the tokens in front of it only comments and literals may
+/// reach across; bytes behind it may already be there. Two zero bytes follow the end, as the
+/// generated scanner wants them, and readers of several bytes at a time may read 64 bytes behind it
+/// and 8 before the beginning.
 class InputBuffer {
 public:
     /// What a refill has to bring.
@@ -47,6 +48,8 @@ public:
     [[nodiscard]] bool openFile(const std::string& name);
     /// Reads a descriptor that somebody else closes.
     void openBorrowed(int descriptor);
+    /// Reads what somebody else brings.
+    void openSource(ByteSource& source);
     /// Reads a copy of a text.
     void openText(std::string_view text);
     /// Reads the bytes of a regular file that were kept, without opening it.
@@ -97,6 +100,7 @@ private:
     [[nodiscard]] bool hasCome(Need need, std::size_t kept, std::size_t& searched);
     [[nodiscard]] bool findLimit(std::size_t& searched);
     void readOnce();
+    [[nodiscard]] std::size_t readBytes(std::size_t room);
     void terminate();
 
     struct Free {
@@ -112,6 +116,7 @@ private:
     std::size_t filled_ = 0;
     std::size_t limit_ = 0;
     int descriptor_ = -1;
+    ByteSource* source_ = nullptr;  // read instead of the descriptor
     bool owned_ = false;
     bool ended_ = true;
     bool readAtOnce_ = false;  // in the first refill

@@ -161,6 +161,12 @@ void ScannerStack::pushFileText(const std::string& fileName, std::string_view te
     enter(std::move(file));
 }
 
+void ScannerStack::pushFileSource(const std::string& fileName, ByteSource& source) {
+    auto file = std::make_unique<CppFileScanner>(commentSink(), options_);
+    file->openSource(fileName, source);
+    enter(std::move(file));
+}
+
 void ScannerStack::enter(std::unique_ptr<CppFileScanner> file) {
     files_.push_back(std::move(file));
     currentSource_ = files_.back().get();

@@ -84,6 +84,8 @@ public:
     /// Does the same for a file whose bytes were kept. One more must be able to be opened.
     void pushKeptFile(const std::string& fileName, std::shared_ptr<FileBytes> bytes,
                       const FileIdentity& identity);
+    /// Reads what somebody else brings as if it were a file.
+    void pushFileSource(const std::string& fileName, ByteSource& source);
     /// Reads a text as if it were a file.
     void pushFileText(const std::string& fileName, std::string_view text);
     /// Reads pieces, taking them over; `pieces` must be restarted before it is used again.

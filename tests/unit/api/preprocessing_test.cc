@@ -1,7 +1,17 @@
 // SPDX-License-Identifier: MIT
 #include "umpre/preprocessing.h"
 
+#include <algorithm>
+#include <cstddef>
+#include <cstdint>
+#include <fstream>
+#include <initializer_list>
+#include <istream>
+#include <memory>
 #include <new>
+#include <optional>
+#include <sstream>
+#include <stdexcept>
 #include <string>
 #include <string_view>
 #include <thread>
@@ -79,6 +89,135 @@ TEST(Preprocessing, KeepsItsOwnCopyOfAText) {
     text.assign("other");
     EXPECT_EQ(f.preprocessing.run(), Outcome::Clean);
     EXPECT_EQ(f.output, "#line 1 \"main\"\ntext\n");
+}
+
+// Brings a text in pieces of this size.
+SourceReader readerOf(std::string text, std::size_t most) {
+    return [text = std::move(text), most, at = std::size_t{0}](char* to, std::size_t size) mutable {
+        const std::size_t count = text.copy(to, std::min(most, size), at);
+        at += count;
+        return std::optional(count);
+    };
+}
+
+TEST(Preprocessing, ReadsWhatAReaderBrings) {
+    std::string text = "#define N 3\n/* a\n */ N \"N\" N";
+    for (int line = 0; line < 10'000; ++line) {
+        text.append("\nint N = N ## N;");
+    }
+    Fixture expected;
+    EXPECT_EQ(expected.run(text), Outcome::Clean);
+    for (const std::size_t most : {1U, 3U, 1000U, 1'000'000U}) {
+        Fixture f;
+        f.preprocessing.setSourceReader("main", readerOf(text, most));
+        EXPECT_EQ(f.preprocessing.run(), Outcome::Clean);
+        EXPECT_EQ(f.output, expected.output) << most;
+    }
+}
+
+TEST(Preprocessing, AsksAReaderForNoMoreThanIsNeeded) {
+    constexpr std::size_t kLines = 1'000'000;
+    constexpr std::size_t kFew = std::size_t{512} * 1024;
+    constexpr std::string_view kLine = "a line of the source text, which is long\n";
+    std::size_t read = 0;
+    std::size_t written = 0;
+    std::size_t most = 0;
+    Preprocessing preprocessing;
+    preprocessing.setOutput([&](std::string_view bytes) {
+        written += bytes.size();
+        return true;
+    });
+    preprocessing.setSourceReader("main", [&](char* to, std::size_t size) {
+        const std::size_t lines = std::min(size / kLine.size(), kLines - read / kLine.size());
+        for (std::size_t line = 0; line < lines; ++line) {
+            kLine.copy(to + line * kLine.size(), kLine.size());
+        }
+        most = std::max(most, read - std::min(read, written));
+        read += lines * kLine.size();
+        return std::optional(lines * kLine.size());
+    });
+    EXPECT_EQ(preprocessing.run(), Outcome::Clean);
+    EXPECT_EQ(read, kLines * kLine.size());
+    EXPECT_LT(most, kFew);
+}
+
+TEST(Preprocessing, TellsThatAReaderFails) {
+    for (const std::optional<std::size_t> answer :
+         {std::optional<std::size_t>{}, std::optional<std::size_t>{SIZE_MAX}}) {
+        Fixture f;
+        bool isFirst = true;
+        f.preprocessing.setSourceReader("main", [&](char* to, std::size_t /*size*/) {
+            return std::exchange(isFirst, false)
+                       ? std::optional(std::string_view("a\nb").copy(to, 3))
+                       : answer;
+        });
+        EXPECT_EQ(f.preprocessing.run(), Outcome::InputFailed);
+        EXPECT_EQ(f.output, "#line 1 \"main\"\na\n");
+        EXPECT_EQ(
+            f.messages,
+            (std::vector<Message>{{Severity::Failure, "main", 2, "input in flex scanner failed"}}));
+    }
+}
+
+TEST(Preprocessing, AsksAReaderAnewInEachRun) {
+    Fixture f;
+    int calls = 0;
+    f.preprocessing.setSourceReader(
+        "main", [&](char* to, std::size_t /*size*/) -> std::optional<std::size_t> {
+            return ++calls % 2 == 0 ? 0 : std::string_view("text\n").copy(to, 5);
+        });
+    EXPECT_EQ(f.preprocessing.run(), Outcome::Clean);
+    EXPECT_EQ(calls, 2);
+    EXPECT_EQ(f.preprocessing.run(), Outcome::Clean);
+    EXPECT_EQ(calls, 4);
+    EXPECT_EQ(f.output, "#line 1 \"main\"\ntext\n#line 1 \"main\"\ntext\n");
+}
+
+TEST(Preprocessing, LetsGoOfAReaderWhenAnotherSourceIsSet) {
+    Fixture f;
+    auto held = std::make_shared<int>(0);
+    f.preprocessing.setSourceReader("main", [held](char* /*to*/, std::size_t /*size*/) {
+        return std::optional<std::size_t>(0);
+    });
+    EXPECT_EQ(held.use_count(), 2);
+    EXPECT_EQ(f.run("text\n"), Outcome::Clean);
+    EXPECT_EQ(held.use_count(), 1);
+    f.preprocessing.setSourceReader("empty", nullptr);
+    EXPECT_EQ(f.preprocessing.run(), Outcome::Clean);
+    EXPECT_EQ(f.output, "#line 1 \"main\"\ntext\n#line 1 \"empty\"\n");
+}
+
+TEST(Preprocessing, ReadsAStreamFromWhereItStands) {
+    std::istringstream stream("first\nsecond\n");
+    stream.exceptions(std::ios::failbit | std::ios::badbit);
+    std::string line;
+    std::getline(stream, line);
+    Fixture f;
+    f.preprocessing.setMessageName("name");
+    f.preprocessing.setSourceStream("main", stream);
+    EXPECT_EQ(f.preprocessing.run(), Outcome::Clean);
+    EXPECT_EQ(f.preprocessing.run(), Outcome::Clean);
+    stream.clear();
+    stream.seekg(0);
+    EXPECT_EQ(f.preprocessing.run(), Outcome::Clean);
+    EXPECT_EQ(f.output,
+              "#line 1 \"name\"\nsecond\n#line 1 \"name\"\n#line 1 \"name\"\nfirst\nsecond\n");
+}
+
+TEST(Preprocessing, TellsThatAStreamFails) {
+    struct Broken final : std::streambuf {
+        int_type underflow() override { throw std::runtime_error("broken"); }
+    } broken;
+
+    std::istream unreadable(&broken);
+    std::ifstream unopened("/nowhere/a.src");
+    for (std::istream* const stream :
+         std::initializer_list<std::istream*>{&unreadable, &unopened}) {
+        Fixture f;
+        f.preprocessing.setSourceStream("main", *stream);
+        EXPECT_EQ(f.preprocessing.run(), Outcome::InputFailed);
+        EXPECT_EQ(f.messages.size(), 1U);
+    }
 }
 
 TEST(Preprocessing, HasAnEmptySourceAtFirst) {

@@ -3,10 +3,12 @@
 
 #include <array>
 #include <cstddef>
+#include <cstdint>
 #include <cstring>
 #include <fcntl.h>
 #include <fstream>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <unistd.h>
@@ -66,6 +68,45 @@ constexpr auto kTexts = std::to_array<std::string_view>({
         text += window;
     }
     return text;
+}
+
+// Brings a text byte by byte; ends, fails, or claims too much.
+class Bytewise final : public ByteSource {
+public:
+    Bytewise(std::string_view text, std::optional<std::size_t> end) : text_(text), end_(end) {}
+
+    [[nodiscard]] std::optional<std::size_t> read(char* to, std::size_t size) override {
+        const std::size_t count = text_.copy(to, size > 0 ? 1 : 0);
+        text_.remove_prefix(count);
+        return count > 0 ? count : end_;
+    }
+
+private:
+    std::string_view text_;
+    std::optional<std::size_t> end_;
+};
+
+TEST(InputBuffer, ReadsWhatSomebodyElseBrings) {
+    for (const std::string_view text : kTexts) {
+        for (const std::size_t size : kWindowSizes) {
+            Bytewise bytes(text, 0);
+            InputBuffer input({.windowSize = size});
+            input.openSource(bytes);
+            EXPECT_EQ(joined(windowsOf(input)), text);
+            EXPECT_GT(input.takeWaits(), text.size());
+            EXPECT_FALSE(input.isReadWhole());
+        }
+    }
+}
+
+TEST(InputBuffer, FailsAsWhoBringsTheBytesDoes) {
+    for (const std::optional<std::size_t> end :
+         {std::optional<std::size_t>{}, std::optional<std::size_t>{SIZE_MAX}}) {
+        Bytewise bytes("a\nb", end);
+        InputBuffer input({});
+        input.openSource(bytes);
+        EXPECT_THROW((void)windowsOf(input), ScannerFailure);
+    }
 }
 
 TEST(InputBuffer, IsEmptyBeforeItIsOpened) {
