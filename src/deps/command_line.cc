@@ -22,8 +22,15 @@ public:
         if (takeFlag(word)) {
             return 1;
         }
-        if (word == "-MF" || word == "-MT" || word == "-MQ" || word == "-o") {
-            return count > 1 ? takeArgument(word, words[1]) : 0;
+        if (hasArgument(word)) {
+            if (word.size() > kGlued) {
+                takeArgument(word.substr(0, kGlued), words[0] + kGlued);
+                return 1;
+            }
+            if (count > 1) {
+                takeArgument(word, words[1]);
+            }
+            return count > 1 ? 2 : 0;
         }
         const int taken = word == "-s" && count > 1 ? 2 : 1;
         options_.words.insert(options_.words.end(), words, words + taken);
@@ -74,7 +81,13 @@ private:
         return false;
     }
 
-    int takeArgument(std::string_view option, const char* argument) {
+    // Tells whether a word is an option with an argument, which may be glued to it, but not to -o.
+    [[nodiscard]] static bool hasArgument(std::string_view word) {
+        const std::string_view option = word.substr(0, kGlued);
+        return word == "-o" || option == "-MF" || option == "-MT" || option == "-MQ";
+    }
+
+    void takeArgument(std::string_view option, const char* argument) {
         if (option == "-MF") {
             options_.ruleName = argument;
         } else if (option == "-o") {
@@ -82,8 +95,9 @@ private:
         } else {
             options_.targets.push_back(option == "-MQ" ? escapedTarget(argument) : argument);
         }
-        return 2;
     }
+
+    static constexpr std::size_t kGlued = 3;  // where a glued argument begins
 
     DepsOptions& options_;
     bool ruleOnly_ = false;
@@ -124,7 +138,7 @@ std::string depsUsage() {
            "  -s <name>      : source name in messages.\n"
            "  -M, -MM        : only the rule; -o names its file.\n"
            "  -MD, -MMD      : with -o, write the rule beside the text, with the suffix .d.\n"
-           "  -MF <name>     : write the rule there instead of standard out.\n"
+           "  -MF <name>     : write the rule there instead of standard out, \"-\".\n"
            "  -MT <target>   : the rule's target, as it is. May be given many times.\n"
            "  -MQ <target>   : the same, with what is special to make escaped.\n"
            "  -MP            : add an empty rule for each included file.\n"

@@ -16,7 +16,7 @@ struct DepsOptions {
 
     Task task = Task::Rule;
     std::vector<std::string> targets;  ///< as they are to be written
-    std::string ruleName;              ///< empty: standard output
+    std::string ruleName;              ///< empty or "-": standard output
     std::string outputName;            ///< of the text; empty: there is none
     bool phonyFiles = false;
     bool absent = false;

@@ -35,10 +35,11 @@ private:
     std::unordered_set<std::string> seen_;
 };
 
-// Writes a text to a file, to standard output if the name is empty. Returns the exit status.
+// Writes a text to a file, to standard output if the name is empty or a hyphen. Returns the exit
+// status.
 int write(const std::string& name, std::string_view text, umpre::ByteSink& errors) {
     umpre::OutputFile file("umpre-deps");
-    if (!name.empty() && !file.open(name)) {
+    if (!name.empty() && name != "-" && !file.open(name)) {
         (void)errors.write("umpre-deps: cannot open output file '" + name + "'\n");
         return 1;
     }
@@ -87,7 +88,8 @@ int preprocess(const umpre::DepsOptions& options, umpre::ByteSink& errors) {
         words.push_back(word.c_str());
     }
     const int count = static_cast<int>(words.size());
-    if (!umpre::parseCommandLine(preprocessor, {output, errors}, count, words.data())) {
+    if (!umpre::parseCommandLine(preprocessor, {output, errors, "umpre-deps"}, count,
+                                 words.data())) {
         return 1;
     }
     const umpre::RunResult result = preprocessor.run();

@@ -3,12 +3,18 @@
 // A blank or a number sign in a name gets a backslash, and the backslashes before it are doubled; a
 // dollar sign is doubled; every other backslash stays. Make and Ninja read that alike. A percent
 // sign matters to Make alone, in targets.
+//
+// The function `wildcard` of Make takes a pattern, in which a backslash stands before what would be
+// special, and gives back names in which nothing is escaped. In a function's arguments a number
+// sign is no comment.
 #include "deps/rule.h"
 
 #include <cstddef>
 
 namespace umpre {
 namespace {
+
+constexpr std::string_view kBlanks = " \t";
 
 std::string escaped(std::string_view name, std::string_view special) {
     std::string text;
@@ -23,6 +29,20 @@ std::string escaped(std::string_view name, std::string_view special) {
         text.push_back(byte);
     }
     return text;
+}
+
+// Returns what Make makes the name of a file, or nothing if there is no such file.
+std::string ifThere(std::string_view name) {
+    std::string pattern;
+    for (const char byte : name) {
+        pattern.append(std::string_view("\\*?[#").find(byte) == std::string_view::npos ? 0 : 1,
+                       '\\');
+        pattern.push_back(byte);
+    }
+    const std::string text = "$(wildcard " + escaped(pattern, kBlanks) + ")";
+    return name.find_first_of(" \t\\*?[") == std::string_view::npos
+               ? text
+               : "$(if " + text + "," + escaped(name, kBlanks) + ")";
 }
 
 }  // namespace
@@ -46,7 +66,7 @@ std::string textOf(const Rule& rule) {
     }
     text.append("\n");
     for (const std::string& file : rule.absent) {
-        text.append(targets).append(": $(wildcard ").append(escapedFile(file)).append(")\n");
+        text.append(targets).append(": ").append(ifThere(file)).append("\n");
     }
     for (std::size_t at = 1; rule.phonyFiles && at < rule.files.size(); ++at) {
         text.append(escapedTarget(rule.files[at])).append(":\n");

@@ -10,8 +10,6 @@
 namespace umpre {
 namespace {
 
-constexpr std::string_view kPrefix = "umpre: ";
-
 constexpr std::string_view kUsage =
     "Usage: umpre [options] [source_file]\n\n"
     "  -I<dir>        : add a directory for searching include files.\n"
@@ -38,6 +36,10 @@ const std::vector<OptionSpec>& optionTable() {
         {"-help", OptionSpec::kTerminal, {}},
     };
     return kTable;
+}
+
+[[nodiscard]] std::string prefixOf(const Console& console) {
+    return std::string(console.program).append(": ");
 }
 
 // Prints the help or the version, if asked for.
@@ -98,7 +100,7 @@ bool takeOutputFile(const OptionParser& options, const Console& console) {
     }
     const std::string name(*word);
     if (!console.output.open(name)) {
-        (void)console.errors.write("umpre: cannot open output file '" + name + "'\n");
+        (void)console.errors.write(prefixOf(console) + "cannot open output file '" + name + "'\n");
         return false;
     }
     return true;
@@ -114,7 +116,8 @@ bool takeSource(const OptionParser& options, Preprocessor& preprocessor, const C
         messageName = *word;
     }
     if (options.freeCount() > 1) {
-        (void)console.errors.write("umpre: cannot provide more than one source file\n");
+        (void)console.errors.write(prefixOf(console)
+                                   + "cannot provide more than one source file\n");
         return false;
     }
     preprocessor.setOutput(console.output);
@@ -125,7 +128,8 @@ bool takeSource(const OptionParser& options, Preprocessor& preprocessor, const C
 
 bool parseCommandLine(Preprocessor& preprocessor, const Console& console, int argc,
                       const char* const* argv) {
-    const OptionParser options(argc, argv, optionTable(), kPrefix, true, console.errors);
+    const std::string prefix = prefixOf(console);
+    const OptionParser options(argc, argv, optionTable(), prefix, true, console.errors);
     if (options.reportUnknown({"unknown option '", "' ('-h' for help)\n"})
         || options.reportMisplaced({"'", "' argument is misplaced ('-h' for help)\n"})) {
         return false;

@@ -16,6 +16,7 @@ namespace umpre {
 struct Console {
     OutputFile& output;  ///< standard output until the command line names a file
     ByteSink& errors;
+    std::string_view program = "umpre";  ///< its name in messages
 };
 
 /// Carries out the command line: definitions, directories, the output file, the source, which is

@@ -41,6 +41,13 @@ TEST(Rule, HasAllItsTargetsInEveryPart) {
               "a b: \\\n  c \\\n  d\na b: $(wildcard e)\nd:\n");
 }
 
+TEST(Rule, AsksMakeForAbsentFilesByPatterns) {
+    EXPECT_EQ(textOf({{"a"}, {"b"}, {"c,d", "e f", "g[h]", "i\\ j"}, false}),
+              "a: \\\n  b\na: $(wildcard c,d)\na: $(if $(wildcard e\\ f),e\\ f)\n"
+              "a: $(if $(wildcard g\\[h]),g[h])\n"
+              "a: $(if $(wildcard i\\\\\\\\\\ j),i\\\\\\ j)\n");
+}
+
 TEST(WithSuffix, ReplacesThatOfTheLastPart) {
     EXPECT_EQ(withSuffix("a.src", ".o"), "a.o");
     EXPECT_EQ(withSuffix("a.b/c", ".o"), "a.b/c.o");
