@@ -61,7 +61,8 @@ struct Definition {
 
 }  // namespace
 
-struct Preprocessing::Settings {
+// Within a class that is seen from outside it would be seen, too.
+struct __attribute__((visibility("hidden"))) Preprocessing::Settings {
     enum class Kind { File, Text, Reader };
 
     // Lets go of the source before.
