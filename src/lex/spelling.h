@@ -42,6 +42,16 @@ namespace umpre {
     return (static_cast<unsigned>(byte == '/') | static_cast<unsigned>(byte == '*')) != 0;
 }
 
+/// Tells whether a comment begins at `at`.
+[[nodiscard]] constexpr bool beginsComment(const char* at, const char* end) noexcept {
+    return end - at > 1 && *at == '/' && isCommentSign(at[1]);
+}
+
+/// The same for a comment that ends with its line.
+[[nodiscard]] constexpr bool beginsLineComment(const char* at, const char* end) noexcept {
+    return end - at > 1 && *at == '/' && at[1] == '/';
+}
+
 inline constexpr std::array<bool, 256> kIsWordByte = [] {
     std::array<bool, 256> isWord{};
     for (std::size_t byte = 0; byte != isWord.size(); ++byte) {

@@ -39,14 +39,6 @@ namespace {
     return end;
 }
 
-[[nodiscard]] bool beginsComment(const char* at, const char* end) noexcept {
-    return end - at > 1 && *at == '/' && isCommentSign(at[1]);
-}
-
-[[nodiscard]] bool beginsLineComment(const char* at, const char* end) noexcept {
-    return end - at > 1 && *at == '/' && at[1] == '/';
-}
-
 }  // namespace
 
 // One pass over the bytes ahead.

@@ -58,10 +58,10 @@ private:
 
     // A text that is read.
     struct Reading {
-        const char* at;
-        const char* end;
-        const char* run;  // what is not added yet begins here
-        Place place;
+        const char* at = nullptr;
+        const char* end = nullptr;
+        const char* run = nullptr;  // what is not added yet begins here
+        Place place = Place::Replacement;
         TextPlaces<PlacesFor::Tokens> places{};
     };
 
