@@ -61,8 +61,8 @@ void KnownConditions::keep(const Place& place, bool value, std::uint64_t version
 
 KnownConditions::Slot* KnownConditions::find(std::uint32_t hash) noexcept {
     Set& set = setOf(hash);
-    const auto slot = std::find_if(set.begin(), set.end(),
-                                   [hash](const Slot& each) { return each.hash == hash; });
+    auto* const slot = std::find_if(set.begin(), set.end(),
+                                    [hash](const Slot& each) { return each.hash == hash; });
     return slot == set.end() ? nullptr : &*slot;
 }
 

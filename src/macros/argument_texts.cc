@@ -23,32 +23,15 @@ public:
         while (at != nullptr && at < end_) {
             if (!isDelimiter(*at)) {
                 at = places_.next(at, end_);
-                if (at == end_) {
-                    return nullptr;
-                }
             }
-            const char byte = *at;
-            if (isNameStart(byte)) {
-                at = passName(at, argument);
-            } else if (isDelimiter(byte)) {
-                if (endsArgument(at, depth)) {
-                    const bool endsWithSpace = at != begin && at[-1] == ' ';
-                    argument.raw = viewOf(begin, endsWithSpace ? at - 1 : at);
-                    return at;
-                }
-                at = passDelimiter(at, depth, argument);
-            } else if (isDigit(byte)) {
-                at = places_.numberEndAt(at);
-            } else if (isBlankByte(byte)) {
-                const char* const behind = passBlanks(at, depth);
-                if (behind != nullptr && behind < end_ && endsArgument(behind, depth)) {
-                    argument.raw = viewOf(begin, at);
-                    return behind;
-                }
-                at = behind;
-            } else {
-                at = unusualTokenEnd(at, end_);
+            if (at == end_) {
+                return nullptr;
             }
+            if (endsArgument(at, depth)) {
+                argument.raw = withoutBlanksBehind(begin, at);
+                return at;
+            }
+            at = passToken(at, depth, argument);
         }
         return nullptr;
     }
@@ -60,6 +43,29 @@ private:
 
     [[nodiscard]] static std::string_view viewOf(const char* begin, const char* end) noexcept {
         return {begin, static_cast<std::size_t>(end - begin)};
+    }
+
+    [[nodiscard]] static std::string_view withoutBlanksBehind(const char* begin,
+                                                              const char* end) noexcept {
+        while (end > begin && isBlankByte(end[-1])) {
+            --end;
+        }
+        return viewOf(begin, end);
+    }
+
+    [[nodiscard]] const char* passToken(const char* at, std::size_t& depth,
+                                        ArgumentText& argument) {
+        const char byte = *at;
+        if (isNameStart(byte)) {
+            return passName(at, argument);
+        }
+        if (isDelimiter(byte)) {
+            return passDelimiter(at, depth, argument);
+        }
+        if (isDigit(byte)) {
+            return places_.numberEndAt(at);
+        }
+        return isBlankByte(byte) ? passBlanks(at, depth) : unusualTokenEnd(at, end_);
     }
 
     [[nodiscard]] const char* passName(const char* at, ArgumentText& argument) const {

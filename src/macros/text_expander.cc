@@ -256,7 +256,7 @@ TextExpander::Part TextExpander::argumentPart(ArgumentText& argument) {
     if (!argument.mayHaveMacros && !watches_) {
         return {argument.raw};
     }
-    const std::size_t index = static_cast<std::size_t>(&argument - arguments_.data());
+    const auto index = static_cast<std::size_t>(&argument - arguments_.data());
     if (!argument.expansion) {
         Result expansion{takeBuffer()};
         if (!read(argument.raw, kNoParts, Place::Argument, expansion)) {
