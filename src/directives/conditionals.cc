@@ -209,7 +209,7 @@ std::optional<bool> Conditionals::isDefined(DirectiveLine& line) {
 
 std::optional<bool> Conditionals::isTrue(DirectiveLine& line) {
     const KnownConditions::Place known =
-        knownConditions_.meet(line.bytesToLineFeed(), macros_.version());
+        knownConditions_.meet(line.bytesToLineFeed(KnownConditions::kLongest), macros_.version());
     if (known.value) {
         line.passBytes(known.text.size());
         return known.value;

@@ -12,13 +12,12 @@
 namespace umpre {
 namespace {
 
-constexpr std::size_t kLongest = 1024;
 constexpr std::size_t kMostBytes = std::size_t{1} << 20U;
 
 }  // namespace
 
 KnownConditions::Place KnownConditions::meet(std::string_view text, std::uint64_t version) {
-    if (text.size() > kLongest) {
+    if (text.empty() || text.size() > kLongest) {
         return {};
     }
     if (sets_.empty()) {

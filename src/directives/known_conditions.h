@@ -25,7 +25,10 @@ public:
         std::optional<bool> value;  ///< if it is known
     };
 
-    /// Looks for a condition and notes that it was met.
+    /// Longer conditions are hardly met again.
+    static constexpr std::size_t kLongest = 1024;
+
+    /// Looks for a condition and notes that it was met, unless it is empty or longer than that.
     [[nodiscard]] Place meet(std::string_view text, std::uint64_t version);
 
     /// Keeps what came out of a condition that comes again, and whose names are watched.

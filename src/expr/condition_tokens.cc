@@ -21,11 +21,7 @@
 #include "macros/predefined_macros.h"
 
 namespace umpre {
-namespace {
-
 using enum TokenKind;
-
-}  // namespace
 
 void ConditionTokens::read(DirectiveLine& line, bool watchesNames) {
     line_ = &line;

@@ -55,10 +55,6 @@ constexpr std::array<Class, 256> kClasses = [] {
     return isBlock || *at == '\r' ? nullptr : at;
 }
 
-[[nodiscard]] bool beginsComment(const char* at) noexcept {
-    return *at == '/' && isCommentSign(at[1]);
-}
-
 [[nodiscard]] bool beginsContinuation(const char* at) noexcept {
     return *at == '\\' && classOf(at[1]) == Class::LineEnd;
 }
@@ -119,13 +115,13 @@ std::optional<std::string_view> DirectiveLine::readText(std::string& memory) {
     }
 }
 
-std::string_view DirectiveLine::bytesToLineFeed() const noexcept {
-    const char* at = at_;
-    ByteBlock::Mask lineFeeds = 0;
-    while ((lineFeeds = ByteBlock(at).any('\n')) == 0) {
-        at += ByteBlock::kSize;
+std::string_view DirectiveLine::bytesToLineFeed(std::size_t most) const noexcept {
+    for (std::size_t size = 0; size < most; size += ByteBlock::kSize) {
+        if (const ByteBlock::Mask lineFeeds = ByteBlock(at_ + size).any('\n'); lineFeeds != 0) {
+            return {at_, size + firstBit(lineFeeds)};
+        }
     }
-    return {at_, static_cast<std::size_t>(at - at_) + firstBit(lineFeeds)};
+    return {};
 }
 
 bool DirectiveLine::skipRest() {

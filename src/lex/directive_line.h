@@ -65,8 +65,8 @@ public:
     /// are used again. Returns nothing if the text cannot be told from the bytes.
     [[nodiscard]] std::optional<std::string_view> readText(std::string& memory);
 
-    /// Returns the bytes ahead up to the next line feed.
-    [[nodiscard]] std::string_view bytesToLineFeed() const noexcept;
+    /// Returns the bytes ahead up to the next line feed; none if they are more than about `most`.
+    [[nodiscard]] std::string_view bytesToLineFeed(std::size_t most) const noexcept;
 
     /// Passes over so many bytes, up to the beginning of a token; no line end is among them.
     void passBytes(std::size_t count) noexcept { at_ += count; }

@@ -8,6 +8,7 @@
 #include "lex/token_join.h"
 
 namespace umpre {
+
 void LexedText::clear() {
     text_.clear();
     tokens_.clear();

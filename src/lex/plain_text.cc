@@ -2,6 +2,7 @@
 #include "lex/plain_text.h"
 
 #include "lex/literal.h"
+#include "lex/spelling.h"
 
 namespace umpre {
 
@@ -11,7 +12,7 @@ const char* unusualTokenEnd(const char* at, const char* end) noexcept {
     case '\r':
     case '\0': return nullptr;
     case '\\': return isLineEndByte(at[1]) ? nullptr : at + 1;
-    case '/': return at[1] == '/' || at[1] == '*' ? nullptr : at + 1;
+    case '/': return isCommentSign(at[1]) ? nullptr : at + 1;
     case '"':
     case '\'': {
         const LiteralScan literal = scanLiteral(at, end);

@@ -42,9 +42,14 @@ namespace umpre {
     return (static_cast<unsigned>(byte == '/') | static_cast<unsigned>(byte == '*')) != 0;
 }
 
-/// Tells whether a comment begins at `at`.
+/// Tells whether a comment begins at `at`, behind which another byte can be read.
+[[nodiscard]] constexpr bool beginsComment(const char* at) noexcept {
+    return *at == '/' && isCommentSign(at[1]);
+}
+
+/// The same before `end`.
 [[nodiscard]] constexpr bool beginsComment(const char* at, const char* end) noexcept {
-    return end - at > 1 && *at == '/' && isCommentSign(at[1]);
+    return end - at > 1 && beginsComment(at);
 }
 
 /// The same for a comment that ends with its line.

@@ -8,12 +8,12 @@
 #include <string_view>
 
 #include "lex/byte_block.h"
-#include "lex/plain_text.h"
+#include "lex/spelling.h"
 
 namespace umpre {
 
-/// Which places a reader of a text looks at, beside those where names and numbers begin and where a
-/// byte stands that is unusual by `textByte`.
+/// Which places a reader of a text looks at, beside those where names, numbers and literals begin,
+/// and those of slashes, backslashes, line ends and zero bytes.
 enum class PlacesFor {
     Tokens,
     Arguments,  ///< "(", ")", ",", and blanks that are more than a space before a token
@@ -72,10 +72,12 @@ private:
         std::array<bool, 256> arePlaces{};
         for (std::size_t at = 0; at != arePlaces.size(); ++at) {
             const char byte = static_cast<char>(at);
-            const bool isForArguments =
-                isBlankByte(byte) || std::string_view("(),").find(byte) != std::string_view::npos;
-            arePlaces[at] = textByte(byte) != TextByte::Plain
-                            || (kFor == PlacesFor::Arguments && isForArguments);
+            const auto isOneOf = [byte](std::string_view bytes) {
+                return bytes.find(byte) != std::string_view::npos;
+            };
+            arePlaces[at] =
+                isWordByte(byte) || isOneOf({"\n\r\0\\/\"'", 7})
+                || (kFor == PlacesFor::Arguments && (isBlankByte(byte) || isOneOf("(),")));
         }
         return arePlaces;
     }();

@@ -72,6 +72,15 @@ TEST_F(DirectiveLineTest, LeavesTheFileBehindTheEndThatItTakes) {
     EXPECT_EQ(testing::readText(file), "b\n");
 }
 
+// Where lines end with carriage returns, a line feed may be the whole file away.
+TEST_F(DirectiveLineTest, LooksForALineFeedAmongSoManyBytes) {
+    EXPECT_EQ(lineOf("#if A > 1\nb\n").bytesToLineFeed(1024), " A > 1");
+    EXPECT_EQ(lineOf("#if\n").bytesToLineFeed(1024), "");
+    const std::string text = " A\r" + std::string(300, 'b') + "\r";
+    EXPECT_EQ(lineOf("#if" + text + "\n").bytesToLineFeed(1024), text);
+    EXPECT_EQ(lineOf("#if" + text + "\n").bytesToLineFeed(128), "");
+}
+
 TEST_F(DirectiveLineTest, ReadsTokens) {
     DirectiveLine line = lineOf("#define N(x) 0x1fL >= /* a */ 'c'\n");
     EXPECT_TRUE(line.isOneLine());
