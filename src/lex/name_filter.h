@@ -12,35 +12,67 @@
 
 namespace umpre {
 
+/// Reads as many bytes as an unsigned number has.
+template <typename Number>
+[[nodiscard]] Number bytesAt(const char* at) noexcept {
+    Number bytes = 0;
+    std::memcpy(&bytes, at, sizeof bytes);
+    return bytes;
+}
+
 /// Returns a hash of a name, made from all its bytes, eight at a time.
 [[nodiscard]] inline std::uint32_t hashOfName(std::string_view name) noexcept {
-    constexpr std::size_t kChunk = sizeof(std::uint64_t);
-    constexpr std::uint64_t kFactor = 0x9E3779B97F4A7C15U;
-    std::uint64_t hash = name.size() * kFactor;
+    using Chunk = std::uint64_t;
+    using HalfChunk = std::uint32_t;
+    constexpr Chunk kFactor = 0x9E3779B97F4A7C15U;
+    const char* const last = name.data() + name.size();
+    Chunk hash = name.size() * kFactor;
     // A multiplication carries bits upwards, a shift brings them down again: the last bytes of a
     // chunk, which stand highest, often make the difference between names.
-    const auto mix = [&hash](std::uint64_t chunk) {
+    const auto mix = [&hash](Chunk chunk) {
         hash = (hash ^ chunk) * kFactor;
         hash ^= hash >> 32U;
     };
-    const auto mixChunkAt = [&](std::size_t at) {
-        std::uint64_t chunk = 0;
-        std::memcpy(&chunk, name.data() + at, kChunk);
-        mix(chunk);
-    };
-    if (name.size() < kChunk) {
-        std::uint64_t chunk = 0;
-        for (const char byte : name) {
-            chunk = chunk << 8U | static_cast<unsigned char>(byte);
+    // What is read twice does no harm: the size tells which bytes these are.
+    if (name.size() >= sizeof(Chunk)) {
+        for (const char* at = name.data(); at + sizeof(Chunk) < last; at += sizeof(Chunk)) {
+            mix(bytesAt<Chunk>(at));
         }
-        mix(chunk);
-    } else {
-        for (std::size_t at = 0; at + kChunk < name.size(); at += kChunk) {
-            mixChunkAt(at);
-        }
-        mixChunkAt(name.size() - kChunk);
+        mix(bytesAt<Chunk>(last - sizeof(Chunk)));
+    } else if (name.size() >= sizeof(HalfChunk)) {
+        mix(Chunk{bytesAt<HalfChunk>(last - sizeof(HalfChunk))} << 32U
+            | bytesAt<HalfChunk>(name.data()));
+    } else if (!name.empty()) {
+        const auto byteAt = [name](std::size_t at) { return bytesAt<unsigned char>(&name[at]); };
+        mix(Chunk{byteAt(0)} | Chunk{byteAt(name.size() / 2)} << 8U
+            | Chunk{byteAt(name.size() - 1)} << 16U);
     }
     return static_cast<std::uint32_t>(hash * kFactor >> 32U);
+}
+
+/// Tells whether two names are the same; for short ones, a call would take longer.
+[[nodiscard]] inline bool areSame(std::string_view name, std::string_view other) noexcept {
+    const std::size_t size = name.size();
+    if (size != other.size()) {
+        return false;
+    }
+    const auto haveSameEnds = [&](auto unit) {
+        using Unit = decltype(unit);
+        const std::size_t last = size - sizeof(Unit);
+        return ((bytesAt<Unit>(name.data()) ^ bytesAt<Unit>(other.data()))
+                | (bytesAt<Unit>(name.data() + last) ^ bytesAt<Unit>(other.data() + last)))
+               == 0;
+    };
+    if (size > 2 * sizeof(std::uint64_t)) {
+        return name == other;
+    }
+    if (size >= sizeof(std::uint64_t)) {
+        return haveSameEnds(std::uint64_t{});
+    }
+    if (size >= sizeof(std::uint32_t)) {
+        return haveSameEnds(std::uint32_t{});
+    }
+    return size == 0 || (haveSameEnds(std::uint8_t{}) && name[size / 2] == other[size / 2]);
 }
 
 /// Tells quickly of most names that they are not in a set of names. It may be wrong the other way.
