@@ -154,7 +154,7 @@ void MacroTable::noteChange(std::string_view name) {
     }
 }
 
-std::size_t MacroTable::slotOf(std::string_view name, std::uint32_t hash) {
+inline std::size_t MacroTable::slotOf(std::string_view name, std::uint32_t hash) {
     const std::size_t mask = slots_.size() - 1;
     std::size_t at = hash & mask;
     while (slots_[at].number != 0 && (slots_[at].hash != hash || !holds(slots_[at], name))) {
