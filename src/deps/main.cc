@@ -62,9 +62,6 @@ int writeRule(const umpre::DepsOptions& options, umpre::Rule rule, umpre::ByteSi
         const std::string& source = rule.files.front();
         rule.targets.push_back(source.empty() ? "-" : umpre::escapedTarget(objectOf(source)));
     }
-    if (rule.files.front().empty()) {
-        rule.files.erase(rule.files.begin());  // standard input is no file
-    }
     return write(options.ruleName, umpre::textOf(rule), errors);
 }
 

@@ -62,7 +62,9 @@ std::string textOf(const Rule& rule) {
     }
     std::string text = targets + ":";
     for (const std::string& file : rule.files) {
-        text.append(" \\\n  ").append(escapedFile(file));
+        if (!file.empty()) {
+            text.append(" \\\n  ").append(escapedFile(file));
+        }
     }
     text.append("\n");
     for (const std::string& file : rule.absent) {

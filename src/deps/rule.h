@@ -11,9 +11,9 @@ namespace umpre {
 /// A rule of a makefile: what is made from which files.
 struct Rule {
     std::vector<std::string> targets;  ///< as they are to be written
-    std::vector<std::string> files;    ///< in their order, each once
+    std::vector<std::string> files;    ///< each once, the source first; empty: standard input
     std::vector<std::string> absent;   ///< what the target will depend on when it comes to be
-    bool phonyFiles = false;  ///< each file but the first is a target without a recipe, too
+    bool phonyFiles = false;  ///< each file but the source is a target without a recipe, too
 };
 
 /// Returns a name as Make and Ninja want it among what a target depends on.
