@@ -2,7 +2,8 @@
 //
 // Files that a grammar makes, on all roads. Each byte chooses one of the ways to go on, so that
 // most inputs hold directives, macros and calls, and small changes of an input are small changes of
-// them.
+// them. Calls stand in each other a few deep only: one that has its argument twice may double the
+// work of what stands in it.
 #include <array>
 #include <cstddef>
 #include <cstdint>
@@ -157,11 +158,15 @@ public:
         while (!pending_.empty()) {
             const char byte = take();
             const char letter = byte == '$' ? take() : '$';
-            if (letter == '$') {
+            if (byte == kUseEnd) {
+                --depth_;
+            } else if (letter == '$') {
                 text += byte;
             } else {
                 const std::vector<std::string_view>& ways = kGrammar.at(letter);
-                push(ways[choose(ways.size())]);
+                const std::size_t choice =
+                    letter == 'u' ? chooseUse(ways.size()) : choose(ways.size());
+                push(ways[choice]);
             }
         }
         return text;
@@ -178,6 +183,14 @@ private:
         return byte;
     }
 
+    // Where uses of macros stand too deep in each other, the first way has no other in it.
+    [[nodiscard]] std::size_t chooseUse(std::size_t count) {
+        constexpr int kDeepest = 6;
+        pending_.push_back(kUseEnd);
+        ++depth_;
+        return depth_ > kDeepest ? 0 : choose(count);
+    }
+
     [[nodiscard]] std::size_t choose(std::size_t count) {
         if (choices_.empty()) {
             return 0;
@@ -187,8 +200,11 @@ private:
         return choice % count;
     }
 
+    static constexpr char kUseEnd = '\x01';
+
     std::string_view choices_;
     std::string pending_;
+    int depth_ = 0;  // of uses of macros
 };
 
 }  // namespace
