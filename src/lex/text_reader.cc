@@ -336,6 +336,7 @@ const char* TextReader::Pass::endBlankLine(const char* start, const Beginning& b
 const char* TextReader::Pass::endLine(const char* lineEnd) {
     output_.countLines(1);
     pass_.countLines(1);
+    // NOLINTNEXTLINE(clang-analyzer-core.NullDereference): no mark is nowhere
     if (*lineEnd == '\n') {
         return lineEnd + 1;
     }

@@ -34,7 +34,7 @@ public:
                     const char* const place = at + firstBit(left);
                     return place < end ? place : end;
                 }
-                at = begin_ + Block::kSize;
+                at = behind_;
             }
             if (end - at < static_cast<std::ptrdiff_t>(Block::kSize)) {
                 return nextOfFew(at, end);
@@ -59,7 +59,7 @@ public:
             if (isSeen(behind) && !isWordByte(*behind)) {
                 return behind;
             }
-            begin_ = nullptr;  // the next token may begin within the word
+            behind_ = nullptr;  // the next token may begin within the word
         }
         return at + numberAt(at).text.size();
     }
@@ -82,9 +82,7 @@ private:
         return arePlaces;
     }();
 
-    [[nodiscard]] bool isSeen(const char* at) const noexcept {
-        return static_cast<std::size_t>(at - begin_) < Block::kSize;
-    }
+    [[nodiscard]] bool isSeen(const char* at) const noexcept { return at < behind_; }
 
     [[nodiscard]] static const char* nextOfFew(const char* at, const char* end) noexcept {
         while (at < end && !kArePlaces[static_cast<unsigned char>(*at)]) {
@@ -96,6 +94,7 @@ private:
     void look(const char* at) noexcept {
         const Block bytes(at);
         begin_ = at;
+        behind_ = at + Block::kSize;
         digits_ = bytes.digits();
         words_ = bytes.letters() | digits_;
         const Mask wordStarts = words_ & ~(words_ << 1U);
@@ -110,8 +109,9 @@ private:
         }
     }
 
-    // What was looked at last. At first it is behind every text.
+    // What was looked at last. No place before it is asked for.
     const char* begin_ = nullptr;
+    const char* behind_ = nullptr;  // null: nothing was
     Mask places_ = 0;
     Mask words_ = 0;
     Mask digits_ = 0;
