@@ -2,7 +2,8 @@
 //
 // A few macros can stand for more text than there is memory in the world. A program meets that
 // limit sooner or later; a fuzzer must not have to wait for it. Both forms of `new` that the
-// program uses, with and without an alignment, are therefore counted here.
+// program uses, with and without an alignment, are therefore counted here, and `realloc` and
+// `free`, whose calls the linker leads here (`--wrap`).
 #include "memory_limit.h"
 
 #include <algorithm>
@@ -10,6 +11,10 @@
 #include <cstdlib>
 #include <malloc.h>
 #include <new>
+
+// NOLINTBEGIN(bugprone-reserved-identifier): these names are the linker's
+extern "C" void* __real_realloc(void* memory, std::size_t size);
+extern "C" void __real_free(void* memory);
 
 namespace umpre::fuzz {
 namespace {
@@ -64,12 +69,34 @@ namespace {
 void release(void* memory) noexcept {
     if (memory != nullptr) {
         held -= std::min(held, ::malloc_usable_size(memory));
-        std::free(memory);
+        __real_free(memory);
     }
+}
+
+[[nodiscard]] void* reallocate(void* memory, std::size_t size) {
+    const std::size_t before = memory == nullptr ? 0 : ::malloc_usable_size(memory);
+    if (size > before && isRefused(size - before)) {
+        return nullptr;
+    }
+    void* const moved = __real_realloc(memory, size);
+    if (moved != nullptr) {
+        held = held - std::min(held, before) + ::malloc_usable_size(moved);
+    }
+    return moved;
 }
 
 }  // namespace
 }  // namespace umpre::fuzz
+
+extern "C" void* __wrap_realloc(void* memory, std::size_t size) {
+    return umpre::fuzz::reallocate(memory, size);
+}
+
+extern "C" void __wrap_free(void* memory) {
+    umpre::fuzz::release(memory);
+}
+
+// NOLINTEND(bugprone-reserved-identifier)
 
 void* operator new(std::size_t size) {
     return umpre::fuzz::allocate(size);
