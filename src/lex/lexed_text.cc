@@ -13,6 +13,7 @@ void LexedText::clear() {
     text_.clear();
     tokens_.clear();
     effects_.clear();
+    lexedAsOne_ = 0;
     outline_.reset();
 }
 

@@ -35,6 +35,10 @@ public:
 
     /// Adds tokens `first` up to, not including, `last` of another text, which has no effects.
     void append(const LexedText& other, std::size_t first, std::size_t last);
+
+    /// Notes that the tokens so far are all that lexing one text gave.
+    void noteLexedAsOne() noexcept { lexedAsOne_ = size(); }
+
     /// Adds an effect of reading the token that will be added next.
     void addCommentEffect(std::size_t lineEnds, bool unterminated, std::int32_t line);
 
@@ -60,6 +64,13 @@ public:
     /// and, if it is a blank, that it is one space between two other tokens.
     [[nodiscard]] bool isClean(std::size_t index) const noexcept {
         return !tokens_[index].has(Entry::kUnclean);
+    }
+
+    /// Tells that a token stays itself wherever a part of this text is joined and lexed again. One
+    /// that is not clean does if all was lexed as one: what comes before it was seen then. A blank
+    /// must be clean.
+    [[nodiscard]] bool staysItself(std::size_t index) const noexcept {
+        return isClean(index) || (lexedAsOne_ == size() && !isBlankOrNewline(kind(index)));
     }
 
     /// Returns the first token from `first` on, and before `last`, that a reader may have to do
@@ -150,6 +161,7 @@ private:
     GrowingArray<char> text_;
     GrowingArray<Entry> tokens_;
     std::vector<Effect> effects_;  // in the order of the tokens
+    std::size_t lexedAsOne_ = 0;   // so many tokens; 0 if they were not
     mutable std::shared_ptr<const TextOutline> outline_;
 };
 

@@ -12,7 +12,7 @@ using enum TokenKind;
     outline.closing.resize(text.size());
     std::vector<std::size_t> open;
     for (std::size_t index = 0; index < text.size() && outline.isPlain; ++index) {
-        outline.isPlain = text.isClean(index);
+        outline.isPlain = text.staysItself(index);
         if (text.kind(index) == LEFT_PARENTHESIS) {
             open.push_back(index);
         } else if (text.kind(index) == RIGHT_PARENTHESIS && !open.empty()) {

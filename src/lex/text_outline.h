@@ -11,7 +11,7 @@ namespace umpre {
 
 /// What is known of a text as a whole.
 struct TextOutline {
-    /// All its tokens are clean: any part of it, joined and lexed again, gives the same tokens.
+    /// All its tokens stay themselves: any part of it, joined and lexed again, gives the same.
     bool isPlain = false;
     /// Of each "(" the place of its ")"; of those without one, and of other tokens, 0.
     std::vector<std::size_t> closing;

@@ -94,7 +94,7 @@ private:
 
     // Looks at one token of an argument. Returns false if it is a blank that must be changed.
     [[nodiscard]] bool look(Argument& argument) const {
-        if (text_.isClean(at_)) {
+        if (text_.staysItself(at_)) {
             return true;
         }
         argument.mustBeLexed = true;

@@ -2,6 +2,7 @@
 #include "lex/text_outline.h"
 
 #include <string_view>
+#include <tuple>
 
 #include <gtest/gtest.h>
 
@@ -16,14 +17,26 @@ namespace {
 }
 
 TEST(TextOutline, OfOrdinaryTextIsPlain) {
-    for (const std::string_view text : {"", "a", "a + b", "f(1.0f, \"x\" 'y')", "a==b&&c"}) {
+    for (const std::string_view text :
+         {"", "a", "a + b", "f(1.0f, \"x\" 'y')", "a==b&&c", "it's"}) {
         EXPECT_TRUE(outlineOf(text).isPlain) << text;
     }
 }
 
 TEST(TextOutline, OfWhatLexingAgainMayChangeIsNot) {
-    for (const std::string_view text : {"a  b", "a\tb", "a\nb", "\"", "it's", "a/*\n*/b"}) {
+    for (const std::string_view text : {"a  b", "a\tb", "a\nb", "' \n'", "a/*\n*/b"}) {
         EXPECT_FALSE(outlineOf(text).isPlain) << text;
+    }
+}
+
+TEST(TextOutline, OfTextsThatWereLexedApartIsPlainIfTheyDoNotMeet) {
+    TextLexer lexer;
+    for (const auto& [first, second, isPlain] :
+         {std::tuple{"a+", "b", true}, {"a", "b", false}, {"it's", " isn't", false}}) {
+        LexedText text;
+        lexer.append(text, first);
+        lexer.append(text, second);
+        EXPECT_EQ(text.outline().isPlain, isPlain) << first << second;
     }
 }
 

@@ -89,6 +89,16 @@ TEST(ArgumentSlices, SayWhichMustBeLexedAgain) {
     EXPECT_FALSE(arguments[1].mustBeLexed);
 }
 
+TEST(ArgumentSlices, OfATextThatWasLexedAsOneNeedNotBeLexedAgain) {
+    SourceFixture f("");
+    f.pushText("(it's, 1x, &&&)");
+    ArgumentList arguments;
+    ASSERT_TRUE(takeArgumentSlices(*f.sources.listReadNow(), 3, arguments));
+    EXPECT_FALSE(arguments[0].mustBeLexed);
+    EXPECT_FALSE(arguments[1].mustBeLexed);
+    EXPECT_FALSE(arguments[2].mustBeLexed);
+}
+
 TEST(ArgumentSlices, HaveTheSetOfTheTokenThatEndsThem) {
     NoExpandSets sets;
     const Name name{"n"};
