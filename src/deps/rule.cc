@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: MIT
 //
-// A blank or a number sign in a name gets a backslash, and the backslashes before it are doubled; a
-// dollar sign is doubled; every other backslash stays. Make and Ninja read that alike. A percent
-// sign matters to Make alone, in targets.
+// A blank, a colon or a number sign in a name gets a backslash, and the backslashes before it are
+// doubled; a dollar sign is doubled; every other backslash stays. Make and Ninja read that alike. A
+// percent sign matters to Make alone, in targets.
 //
 // The function `wildcard` of Make takes a pattern, in which a backslash stands before what would be
 // special, and gives back names in which nothing is escaped. In a function's arguments a number
@@ -15,6 +15,7 @@ namespace umpre {
 namespace {
 
 constexpr std::string_view kBlanks = " \t";
+constexpr std::string_view kBlanksAndColon = " \t:";
 
 std::string escaped(std::string_view name, std::string_view special) {
     std::string text;
@@ -40,19 +41,19 @@ std::string ifThere(std::string_view name) {
         pattern.push_back(byte);
     }
     const std::string text = "$(wildcard " + escaped(pattern, kBlanks) + ")";
-    return name.find_first_of(" \t\\*?[") == std::string_view::npos
+    return name.find_first_of(" \t:\\*?[") == std::string_view::npos
                ? text
-               : "$(if " + text + "," + escaped(name, kBlanks) + ")";
+               : "$(if " + text + "," + escaped(name, kBlanksAndColon) + ")";
 }
 
 }  // namespace
 
 std::string escapedFile(std::string_view name) {
-    return escaped(name, " \t#");
+    return escaped(name, " \t:#");
 }
 
 std::string escapedTarget(std::string_view name) {
-    return escaped(name, " \t#%");
+    return escaped(name, " \t:#%");
 }
 
 std::string textOf(const Rule& rule) {

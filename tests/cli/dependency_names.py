@@ -18,7 +18,7 @@ import tempfile
 import time
 
 NAMES = ["plain", "a b", "a  b", " a", "a#b", "#a", "a# b", "a$b", "$a$$b", "$(a)", "${a}", "a%b", "a\\b",
-         "a\\ b", "a\\\\ b", "a[b]", "a~b", "a+b,c@d", "ä"]
+         "a:b", "a\\ b", "a\\\\ b", "a[b]", "a~b", "a+b,c@d", "ä"]
 # What only make can read.
 NAMES_OF_MAKE = ["a\\#b", "a'b", "a&b", "a*b", "a?b"]
 

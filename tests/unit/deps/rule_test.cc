@@ -23,6 +23,7 @@ TEST(Rule, EscapesNames) {
         {"a b", "a\\ b", "a\\ b"},
         {"a\tb", "a\\\tb", "a\\\tb"},
         {"a#b", "a\\#b", "a\\#b"},
+        {"a:b", "a\\:b", "a\\:b"},
         {"$a$$", "$$a$$$$", "$$a$$$$"},
         {"a%b", "a%b", "a\\%b"},
         {"a\\b", "a\\b", "a\\b"},
@@ -42,10 +43,11 @@ TEST(Rule, HasAllItsTargetsInEveryPart) {
 }
 
 TEST(Rule, AsksMakeForAbsentFilesByPatterns) {
-    EXPECT_EQ(textOf({{"a"}, {"b"}, {"c,d", "e f", "g[h]", "i\\ j"}, false}),
+    EXPECT_EQ(textOf({{"a"}, {"b"}, {"c,d", "e f", "g[h]", "i\\ j", "k:l"}, false}),
               "a: \\\n  b\na: $(wildcard c,d)\na: $(if $(wildcard e\\ f),e\\ f)\n"
               "a: $(if $(wildcard g\\[h]),g[h])\n"
-              "a: $(if $(wildcard i\\\\\\\\\\ j),i\\\\\\ j)\n");
+              "a: $(if $(wildcard i\\\\\\\\\\ j),i\\\\\\ j)\n"
+              "a: $(if $(wildcard k:l),k\\:l)\n");
 }
 
 TEST(WithSuffix, ReplacesThatOfTheLastPart) {
