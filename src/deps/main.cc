@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 //
 // umpre-deps: preprocesses as umpre does, and writes which files were read, as a rule for Make.
+#include <optional>
 #include <string>
 #include <string_view>
 #include <unistd.h>
@@ -14,7 +15,7 @@
 #include "driver/diagnostics.h"
 #include "driver/output_file.h"
 #include "driver/preprocessor.h"
-#include "driver/standard_descriptors.h"
+#include "driver/program.h"
 #include "driver/version.h"
 
 namespace {
@@ -68,6 +69,7 @@ int writeRule(const umpre::DepsOptions& options, umpre::Rule rule, umpre::ByteSi
 int preprocess(const umpre::DepsOptions& options, umpre::ByteSink& errors) {
     umpre::OutputFile output("umpre-deps");
     if (options.outputName.empty() && !output.open("/dev/null")) {
+        (void)errors.write("umpre-deps: cannot open output file '/dev/null'\n");
         return 1;
     }
     Names files;
@@ -100,10 +102,7 @@ int preprocess(const umpre::DepsOptions& options, umpre::ByteSink& errors) {
     return writeRule(options, {{}, files.list(), absent.list(), options.phonyFiles}, errors);
 }
 
-}  // namespace
-
-int main(int argc, char** argv) {
-    umpre::openStandardDescriptors();
+int run(int argc, char** argv) {
     umpre::DescriptorSink errors(STDERR_FILENO);
     const std::optional<umpre::DepsOptions> options = umpre::readDepsOptions(argc, argv, errors);
     if (!options) {
@@ -116,4 +115,10 @@ int main(int argc, char** argv) {
     case umpre::DepsOptions::Task::Rule: break;
     }
     return preprocess(*options, errors);
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    return umpre::runProgram(run, argc, argv);
 }

@@ -1,15 +1,12 @@
 // SPDX-License-Identifier: MIT
 #include <csignal>
-#include <exception>
-#include <new>
 #include <unistd.h>
 
 #include "driver/command_line.h"
 #include "driver/diagnostics.h"
 #include "driver/output_file.h"
 #include "driver/preprocessor.h"
-#include "driver/standard_descriptors.h"
-#include "lex/scanner_failure.h"
+#include "driver/program.h"
 
 #ifndef UMPRE_PLAIN_ROAD
 #define UMPRE_PLAIN_ROAD false
@@ -27,17 +24,6 @@ void raiseArithmeticFault() {
     (void)::sigprocmask(SIG_UNBLOCK, &signals, nullptr);
     (void)std::signal(SIGFPE, SIG_DFL);
     (void)std::raise(SIGFPE);
-}
-
-int reportNoMemory() {
-    umpre::DescriptorSink errors(STDERR_FILENO);
-    (void)(errors.write(umpre::kNoMemory) && errors.write("\n"));
-    return kScannerFailure;
-}
-
-// Called where there is not even the memory to throw an exception.
-[[noreturn]] void endWithoutMemory() {
-    ::_exit(reportNoMemory());
 }
 
 int preprocess(int argc, char** argv) {
@@ -66,11 +52,5 @@ int preprocess(int argc, char** argv) {
 }  // namespace
 
 int main(int argc, char** argv) {
-    std::set_terminate(endWithoutMemory);
-    umpre::openStandardDescriptors();
-    try {
-        return preprocess(argc, argv);
-    } catch (const std::bad_alloc&) {
-        return reportNoMemory();
-    }
+    return umpre::runProgram(preprocess, argc, argv);
 }

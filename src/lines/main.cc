@@ -5,12 +5,13 @@
 #include <array>
 #include <cerrno>
 #include <fcntl.h>
+#include <optional>
 #include <string>
 #include <sys/stat.h>
 #include <unistd.h>
 
 #include "driver/output_file.h"
-#include "driver/standard_descriptors.h"
+#include "driver/program.h"
 #include "driver/version.h"
 #include "lex/byte_sink.h"
 #include "lex/output_writer.h"
@@ -108,10 +109,7 @@ std::string carryOut(const umpre::LinesOptions& options, umpre::OutputFile& file
     }
 }
 
-}  // namespace
-
-int main(int argc, char** argv) {
-    umpre::openStandardDescriptors();
+int run(int argc, char** argv) {
     umpre::DescriptorSink errors(STDERR_FILENO);
     umpre::OutputFile file("umpre-lines");
     const std::optional<umpre::LinesOptions> options = umpre::readLinesOptions(argc, argv, errors);
@@ -121,4 +119,10 @@ int main(int argc, char** argv) {
     const std::string problem = carryOut(*options, file);
     (void)errors.write(problem);
     return problem.empty() ? 0 : 1;
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    return umpre::runProgram(run, argc, argv);
 }
