@@ -1,18 +1,17 @@
 // SPDX-License-Identifier: MIT
 #include "lex/name_filter.h"
 
-#include <algorithm>
-
 namespace umpre {
 namespace {
 
 constexpr unsigned kLeastBits = 16;  // as powers of two
 constexpr unsigned kMostBits = 21;   // what stays close to the processor
+constexpr std::size_t kLeastWords = (std::size_t{1} << kLeastBits) / 64;
 constexpr std::size_t kBitsForEach = 16;
 
 }  // namespace
 
-NameFilter::NameFilter() : bits_((std::size_t{1} << kLeastBits) / 64), shift_(32 - kLeastBits) {}
+NameFilter::NameFilter() : bits_(kLeastWords), shift_(32 - kLeastBits) {}
 
 void NameFilter::add(std::string_view name) {
     std::array<char, kChunk> bytes{};
@@ -27,10 +26,12 @@ void NameFilter::add(std::string_view name) {
     addBit(hash);
 }
 
+// A filter that is cleared again and again need not be as large as it once was.
 void NameFilter::clear() noexcept {
     size_ = 0;
     hashes_.clear();
-    std::fill(bits_.begin(), bits_.end(), 0);
+    shift_ = 32 - kLeastBits;
+    bits_.assign(kLeastWords, 0);
 }
 
 void NameFilter::grow() {

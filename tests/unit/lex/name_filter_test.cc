@@ -70,6 +70,25 @@ TEST(NameFilter, StopsNearlyAllOtherNamesHoweverManyItHolds) {
     EXPECT_LT(passed, kCount / 8);
 }
 
+TEST(NameFilter, ForgetsItsNamesAndGrowsAgain) {
+    NameFilter filter;
+    constexpr int kCount = 100'000;
+    for (int number = 0; number < kCount; ++number) {
+        filter.add("A" + std::to_string(number));
+    }
+    filter.clear();
+    EXPECT_EQ(filter.size(), 0U);
+    for (int number = 0; number < kCount; ++number) {
+        EXPECT_FALSE(filter.mayHold("A" + std::to_string(number)));
+    }
+    for (int number = 0; number < kCount; ++number) {
+        filter.add("B" + std::to_string(number));
+    }
+    for (int number = 0; number < kCount; ++number) {
+        EXPECT_TRUE(filter.mayHold("B" + std::to_string(number)));
+    }
+}
+
 TEST(NameFilter, LooksAtTheBytesOfTheNameAlone) {
     NameFilter filter;
     for (const std::string name :
