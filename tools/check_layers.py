@@ -8,7 +8,7 @@ first column, each below what it includes. The rules:
 
 - every component is listed, and everything listed exists;
 - a folder includes itself and folders further left in the order umpre (the public headers), lex,
-  macros, expr, directives, driver, api, lines, deps;
+  macros, expr, directives, driver, api, deps, lines;
 - inside a folder a component includes only what stands above it, which makes cycles impossible.
 """
 
@@ -17,7 +17,7 @@ import re
 import sys
 
 ROOT = pathlib.Path(__file__).resolve().parent.parent
-FOLDERS = ["umpre", "lex", "macros", "expr", "directives", "driver", "api", "lines", "deps"]
+FOLDERS = ["umpre", "lex", "macros", "expr", "directives", "driver", "api", "deps", "lines"]
 SUFFIXES = {".h", ".in", ".cc", ".l"}
 HEADING = re.compile(r"#+ `([a-z]+)/`")
 ROW = re.compile(r"\| *`([a-z_]+)`")
