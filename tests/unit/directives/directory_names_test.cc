@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "directives/directory_names.h"
 
+#include <cstdint>
 #include <filesystem>
 #include <string>
 
@@ -69,7 +70,7 @@ TEST(DirectoryNames, ReadsNoDirectoryForAFewMisses) {
     EXPECT_FALSE(i.lacks("missing.h"));
 }
 
-TEST(DirectoryNames, SeesAnewNameInTheNextMoment) {
+TEST(DirectoryNames, SeesANewNameInTheNextMoment) {
     NamesFixture i;
     SKIP_IF_NOT_TOLD(i);
     i.directory.write("in/missing.h", "");

@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: MIT
 #include "directives/file_finder.h"
 
+#include <cstdint>
+#include <filesystem>
 #include <memory>
 #include <optional>
 #include <string>

@@ -2,7 +2,6 @@
 #include "directives/guard_watch.h"
 
 #include <memory>
-#include <string>
 #include <string_view>
 
 #include <gtest/gtest.h>

@@ -17,9 +17,8 @@ public:
         memory_.append(ByteBlock::kSize, '\n');
     }
 
-    operator std::string_view() const {
-        return {memory_.data(), size_};
-    }  // NOLINT(google-explicit-constructor): a text in place of a view
+    // In the place of a view. NOLINTNEXTLINE(google-explicit-constructor)
+    operator std::string_view() const { return {memory_.data(), size_}; }
 
 private:
     std::string memory_;

@@ -1,8 +1,6 @@
 // SPDX-License-Identifier: MIT
 #include "directives/operand.h"
 
-#include <string>
-
 #include <gtest/gtest.h>
 
 #include "support/macro_fixture.h"

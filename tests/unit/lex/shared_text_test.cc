@@ -2,6 +2,7 @@
 #include "lex/shared_text.h"
 
 #include <utility>
+#include <vector>
 
 #include <gtest/gtest.h>
 

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "lex/source_position.h"
 
+#include <cstdint>
 #include <limits>
 
 #include <gtest/gtest.h>

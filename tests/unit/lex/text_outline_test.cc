@@ -1,8 +1,10 @@
 // SPDX-License-Identifier: MIT
 #include "lex/text_outline.h"
 
+#include <cstddef>
 #include <string_view>
 #include <tuple>
+#include <vector>
 
 #include <gtest/gtest.h>
 

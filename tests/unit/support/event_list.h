@@ -1,6 +1,6 @@
 // SPDX-License-Identifier: MIT
-#ifndef UMPRE_SUPPORT_EVENT_LIST_H
-#define UMPRE_SUPPORT_EVENT_LIST_H
+#ifndef UMPRE_TESTS_UNIT_SUPPORT_EVENT_LIST_H
+#define UMPRE_TESTS_UNIT_SUPPORT_EVENT_LIST_H
 
 #include <string>
 
