@@ -14,7 +14,6 @@
 #include <stdexcept>
 #include <string>
 #include <string_view>
-#include <thread>
 #include <utility>
 #include <vector>
 
@@ -381,34 +380,6 @@ TEST(Preprocessing, CanBeMoved) {
 
 TEST(Preprocessing, HasTheVersionOfItsHeaders) {
     EXPECT_STREQ(Preprocessing::version(), UMPRE_VERSION);
-}
-
-// What one thread makes of its own source.
-std::string resultOf(const std::string& name) {
-    Fixture f;
-    f.preprocessing.define("NAME", name);
-    std::string text = "#define TWICE(x) x x\n";
-    for (int count = 0; count < 2000; ++count) {
-        text.append("TWICE(NAME) \"")
-            .append(name)
-            .append("\" __LINE__ # /* x\n */\n#if NAME == 1\n#endif\n");
-    }
-    text.append("#endif\n");
-    EXPECT_EQ(f.run(text), Outcome::Errors);
-    return f.output + std::to_string(f.messages.size());
-}
-
-TEST(Preprocessing, RunsInTwoThreads) {
-    const std::string first = resultOf("1");
-    const std::string second = resultOf("two");
-    std::string firstAgain;
-    std::string secondAgain;
-    std::thread other([&secondAgain] { secondAgain = resultOf("two"); });
-    firstAgain = resultOf("1");
-    other.join();
-    EXPECT_EQ(firstAgain, first);
-    EXPECT_EQ(secondAgain, second);
-    EXPECT_NE(first, second);
 }
 
 struct Line {
