@@ -5,9 +5,7 @@
 //
 //     TORTURE_MODE=once     the call TORTURE_CALL of all, counted from 1
 //     TORTURE_MODE=memory   the memory call TORTURE_CALL and every later one
-//     TORTURE_MODE=short    none; but from the call TORTURE_CALL on, reads and writes move a byte
-//     at
-//                           a time
+//     TORTURE_MODE=short    none; but from the call TORTURE_CALL on, reads and writes move one byte
 //
 // When the program ends, a line in the file TORTURE_REPORT says how many calls there were, how many
 // of them concerned memory, what failed first, and what was not given back:

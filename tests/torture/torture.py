@@ -4,9 +4,10 @@
 
 The cases stand in cases.txt; in none of them is a file to be found in two directories, because one
 that cannot be opened is looked for in the next. fail_nth.cc says which calls can fail and how.
-Whatever fails, the program ends with status 0, 1 or 2 and never by a signal; with 0 only when its whole output is there;
-a status that changes comes with a message; what is written before status 2 is the beginning of what
-would have been; and all memory and every descriptor is given back, as in the run without failures.
+Whatever fails, the program ends with status 0, 1 or 2 and never by a signal; with 0 only when its
+whole output is there; a status that changes comes with a message; what is written before status 2 is
+the beginning of what would have been; and all memory and every descriptor is given back, as in the
+run without failures.
 """
 
 import argparse
