@@ -16,15 +16,21 @@ BLANK_LINE = re.compile(rb"^[ \t\v\f]+$", re.MULTILINE)
 WORD = re.compile(rb"w\d+w")
 
 
+class InputError(Exception):
+    """Something was reported about the source."""
+
+
 def preprocessed(umpre, folder, files):
-    """Returns what comes out for the file main, which must be read without an error."""
+    """Returns what comes out for the file main, in which there must be nothing to report."""
     for name, text in files.items():
         path = folder / name
         path.parent.mkdir(parents=True, exist_ok=True)
         path.write_bytes(text)
     done = subprocess.run([umpre, "-Iinc", "main"], cwd=folder, capture_output=True, check=False)
+    if done.returncode not in (0, 1):
+        raise AssertionError(f"{files!r} ended with status {done.returncode}")
     if done.returncode != 0 or done.stderr:
-        raise AssertionError(f"status {done.returncode}, errors {done.stderr!r}")
+        raise InputError(f"{files!r} gave status {done.returncode}, errors {done.stderr!r}")
     return done.stdout
 
 
@@ -68,8 +74,9 @@ class Words:
         parts = []
         for _ in range(self.generator.randrange(1, 6)):
             parts.append(self.word(name, line + b"".join(parts).count(b"\n")))
-            parts.append(self.generator.choice(
-                (b" ", b" ", b", ", b" N ", b"/* c */", b" /* a\nb */ ", b" \\\n", b"/*\n\n*/", b"\t+ ")))
+            parts.append(self.generator.choice((
+                b" ", b" ", b", ", b" N ", b"/* c */", b" /* a\nb */ ", b" \\\n", b"/*\n\n*/",
+                b"\t+ ")))
         return b"".join(parts) + self.generator.choice((b"", b"", b"", b"// c", b" /* c\n*/"))
 
     def skipped(self, name):
@@ -155,15 +162,21 @@ def text_of(output):
     return b"".join(MARKER.sub(b"", output).split())
 
 
-def may_be_cut(umpre, folder, generator):
-    """A source whose first part is moved to a file that it includes gives the same text."""
-    while True:
+def correct_program(umpre, folder, generator):
+    """Returns the pieces of a source without errors, which would be others in other places, and what
+    comes out for it."""
+    for _ in range(1000):
         pieces = program(generator)
         try:
-            whole = preprocessed(umpre, folder, {"main": b"".join(pieces)})
-            break
-        except AssertionError:
-            continue  # an error, which would be another one in another place
+            return pieces, preprocessed(umpre, folder, {"main": b"".join(pieces)})
+        except InputError:
+            pass
+    raise AssertionError("there is an error in every source")
+
+
+def may_be_cut(umpre, folder, generator):
+    """A source whose first part is moved to a file that it includes gives the same text."""
+    pieces, whole = correct_program(umpre, folder, generator)
     cut = generator.randrange(len(pieces) + 1)
     files = {"part": b"".join(pieces[:cut]), "main": b'#include "part"\n' + b"".join(pieces[cut:])}
     parted = preprocessed(umpre, folder, files)
@@ -187,7 +200,7 @@ def main():
             with tempfile.TemporaryDirectory() as folder:
                 try:
                     check(umpre, pathlib.Path(folder), random.Random(seed))
-                except AssertionError as wrong:
+                except (AssertionError, InputError) as wrong:
                     print(f"{check.__name__}, seed {seed}: {wrong}")
                     failed += 1
     print(f"{sum(PROPERTIES.values()) * options.times - failed} passed, {failed} failed")
