@@ -3,11 +3,15 @@
 #
 # tests/package/chroot.sh FOLDER PACKAGE...
 #
-# Makes a bare Debian 12 in FOLDER, installs the packages there, and uses them as a first user does:
-# the programs, their man pages, the CMake function, the library. Shows what comes out. Takes the folder
-# away afterwards. Needs root.
+# Makes a bare Debian 12 in FOLDER, which must not be there, installs the packages there, and uses
+# them as a first user does: the programs, their man pages, the CMake function, the library. Shows what
+# comes out. Takes the folder away afterwards. Needs root.
 set -euo pipefail
 root=$(cd "$(dirname "${BASH_SOURCE[0]}")/../.." && pwd -P)
+if (($# < 2)) || [[ -e $1 ]]; then
+    printf 'usage: tests/package/chroot.sh FOLDER PACKAGE...  (FOLDER must not be there)\n' >&2
+    exit 1
+fi
 folder=$1
 shift
 trap 'rm -rf --one-file-system "$folder"' EXIT
