@@ -1,6 +1,6 @@
 # SPDX-License-Identifier: MIT
 # shellcheck shell=bash disable=SC2034
-# What script/run, script/test and .ci/run share: tools, builds, running tests. It is sourced.
+# What the scripts of this folder and .ci/run share: tools, builds, running tests. It is sourced.
 
 root=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd -P)
 build=$root/build
