@@ -10,7 +10,7 @@ set(package_dir ${CMAKE_INSTALL_DATADIR}/cmake/umpre)
 install(TARGETS umpre umpre-deps umpre-lines EXPORT umpreProgramTargets RUNTIME COMPONENT programs)
 install(FILES docs/umpre.1 docs/umpre-deps.1 docs/umpre-lines.1
     DESTINATION ${CMAKE_INSTALL_MANDIR}/man1 COMPONENT programs)
-install(FILES README.md CHANGELOG.md CONTRIBUTING.md LICENSE TYPE DOC COMPONENT programs)
+install(FILES README.md CHANGELOG.md CONTRIBUTING.md SECURITY.md LICENSE TYPE DOC COMPONENT programs)
 install(DIRECTORY docs TYPE DOC COMPONENT programs FILES_MATCHING PATTERN *.md PATTERN *.svg)
 install(FILES completions/umpre.bash RENAME umpre
     DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions COMPONENT programs)
@@ -31,7 +31,8 @@ install(FILES completions/umpre.fish completions/umpre-deps.fish completions/ump
 configure_package_config_file(cmake/umpreConfig.cmake.in umpreConfig.cmake
     INSTALL_DESTINATION ${package_dir})
 write_basic_package_version_file(umpreConfigVersion.cmake COMPATIBILITY SameMajorVersion)
-install(FILES cmake/umpre_preprocess.cmake ${PROJECT_BINARY_DIR}/umpreConfig.cmake ${PROJECT_BINARY_DIR}/umpreConfigVersion.cmake
+install(FILES cmake/umpre_preprocess.cmake ${PROJECT_BINARY_DIR}/umpreConfig.cmake
+    ${PROJECT_BINARY_DIR}/umpreConfigVersion.cmake
     DESTINATION ${package_dir} COMPONENT programs)
 install(EXPORT umpreProgramTargets NAMESPACE umpre:: DESTINATION ${package_dir} COMPONENT programs)
 

@@ -42,6 +42,7 @@ share/doc/umpre/CHANGELOG.md
 share/doc/umpre/CONTRIBUTING.md
 share/doc/umpre/LICENSE
 share/doc/umpre/README.md
+share/doc/umpre/SECURITY.md
 share/fish/vendor_completions.d/umpre-deps.fish
 share/fish/vendor_completions.d/umpre-lines.fish
 share/fish/vendor_completions.d/umpre.fish
