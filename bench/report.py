@@ -6,9 +6,10 @@ from dataclasses import dataclass
 
 from generate import ROOT
 from tools import PEERS
-from workloads import WORKLOADS
 
 PAGE = ROOT / "docs/performance.md"
+# Whose memory a line for the terminal has.
+SHOWN = ("umpre", "other", "gcc", "tcc")
 # The least ratio to keep for each workload.
 GOALS = {
     "plain": 10,
@@ -45,9 +46,6 @@ def comparison_line(result):
     verdict = f"{result.best_peer()} {ratio:.2f}x" if ratio else "no ratio"
     memory = ", ".join(f"{n} {megabytes(result.memory[n])}" for n in result.memory if n in SHOWN)
     return f"{result.workload:<10} {verdict:<13} {', '.join(times)} ms; {memory} MB"
-
-
-SHOWN = ("umpre", "other", "gcc", "tcc")
 
 
 def table(head, rows):
