@@ -5,6 +5,7 @@
 Addresses that begin with a scheme, as https:, are left alone.
 """
 
+import collections
 import pathlib
 import re
 import sys
@@ -18,11 +19,11 @@ HEADING = re.compile(r"^#+ +(.+?) *#*$", re.MULTILINE)
 
 def anchors(page):
     """Returns the names of a page's headings, as they stand behind the # of a link."""
-    found = set()
+    found, times = set(), collections.Counter()
     for heading in HEADING.findall(FENCE.sub("", page.read_text(encoding="utf-8"))):
         name = re.sub(r"[^\w\- ]", "", heading.lower()).replace(" ", "-")
-        twins = sum(other == name or other.startswith(name + "-") for other in found)
-        found.add(f"{name}-{twins}" if name in found else name)
+        found.add(f"{name}-{times[name]}" if times[name] else name)
+        times[name] += 1
     return found
 
 
