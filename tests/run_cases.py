@@ -34,15 +34,15 @@ MARKS = {byte: f"<{mark}>" for mark, byte in BYTES.items()}
 Case = collections.namedtuple("Case", "name path start lines")
 
 
-def programOf(case):
+def program_of(case):
     """Returns the program that a case runs; nothing if it is not exactly one."""
     runs = [line for line in case.lines if line.startswith("run: ")]
     return shlex.split(runs[0])[1] if len(runs) == 1 else None
 
 
-def pathFor(case, umpre):
+def path_for(case, umpre):
     """Returns where the program is that a case runs: others than umpre lie beside it."""
-    name = programOf(case)
+    name = program_of(case)
     return umpre if name == "umpre" else os.path.join(os.path.dirname(umpre), name)
 
 
@@ -63,12 +63,12 @@ def parse(case):
             raise ValueError(where + "neither a new section nor a bar, a blank and visible text")
     if case.path.suffix == ".case" and not "".join(title):
         raise ValueError("a case opens with a title")
-    if programOf(case) not in PROGRAMS:
+    if program_of(case) not in PROGRAMS:
         raise ValueError("a case has one line `run: umpre ...`, or of a program beside it")
     return "\n".join(title).strip(), sections
 
 
-def textOf(sections):
+def text_of(sections):
     """Returns the lines of each section, in the order in which sections stand in a case."""
     headers = sorted(sections, key=lambda header: ORDER.index(re.match("[a-z]+", header)[0]))
     return [[header] + [f"| {line}".rstrip() for line in sections[header]] for header in headers]
@@ -150,16 +150,16 @@ def run(case, command):
     """Returns how a case differs from what happened, and the lines that would say what did."""
     try:
         title, sections = parse(case)
-        result = outcome(sections, [*command[:-1], pathFor(case, command[-1])])
+        result = outcome(sections, [*command[:-1], path_for(case, command[-1])])
     except ValueError as why:
         return f"--- {case.name}\n{why}\n", None
-    before, after = (sum(textOf(part), []) for part in (sections, result))
+    before, after = (sum(text_of(part), []) for part in (sections, result))
     difference = difflib.unified_diff(before, after, case.name, "what happened", lineterm="")
-    blocks = [title] * bool(title) + ["\n".join(lines) for lines in textOf(result)]
+    blocks = [title] * bool(title) + ["\n".join(lines) for lines in text_of(result)]
     return "".join(line + "\n" for line in difference), "\n\n".join(blocks).split("\n")
 
 
-def findCases():
+def find_cases():
     cases = []
     for path in sorted(ROOT.glob("tests/cases/**/*.case")):
         name = str(path.relative_to(ROOT / "tests/cases").with_suffix(""))
@@ -183,7 +183,7 @@ def main():
     parser.add_argument("--exact", action="store_true", help="a NAME is a whole name, not a part")
     parser.add_argument("names", metavar="NAME", nargs="*", help="cases with NAME in their name")
     options = parser.parse_args()
-    cases = [case for case in findCases() if not options.names or any(
+    cases = [case for case in find_cases() if not options.names or any(
         case.name == name if options.exact else name in case.name for name in options.names)]
     if options.list:
         print("\n".join(case.name for case in cases))
@@ -192,8 +192,8 @@ def main():
     if not os.access(command[-1], os.X_OK):
         sys.exit(f"run_cases.py: there is no program {command[-1]}")
     # A build need not have all the programs.
-    cases = [case for case in cases if programOf(case) not in PROGRAMS
-             or os.access(pathFor(case, command[-1]), os.X_OK)]
+    cases = [case for case in cases if program_of(case) not in PROGRAMS
+             or os.access(path_for(case, command[-1]), os.X_OK)]
     resource.setrlimit(resource.RLIMIT_CORE, (0, 0))  # a core would be one more file
     failed = 0
     with concurrent.futures.ThreadPoolExecutor(options.jobs) as pool:

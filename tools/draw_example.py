@@ -113,7 +113,7 @@ def drawn(command, files, output):
 
 def picture(umpre):
     """Returns the picture of what the program makes of the example."""
-    (case,) = (case for case in run_cases.findCases() if case.name == CASE)
+    (case,) = (case for case in run_cases.find_cases() if case.name == CASE)
     _, sections = run_cases.parse(case)
     result = run_cases.outcome(sections, [umpre])
     command = next(header for header in result if header.startswith("run"))[5:]

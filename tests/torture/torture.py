@@ -38,7 +38,7 @@ class Tortured:
         self.name, self.folder = name, folder / "run"
         self.place = folder
         self.preload = library
-        case = next(case for case in run_cases.findCases() if case.name == name)
+        case = next(case for case in run_cases.find_cases() if case.name == name)
         self.sections = run_cases.parse(case)[1]
         header = next(header for header in self.sections if header.startswith("run"))
         self.command = [umpre] + [os.fsencode(run_cases.given([word + "<END>"]))
