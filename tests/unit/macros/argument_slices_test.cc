@@ -8,13 +8,15 @@
 
 #include <gtest/gtest.h>
 
+#include "support/argument_lists.h"
 #include "support/source_fixture.h"
 
 namespace umpre {
 namespace {
 
 using testing::SourceFixture;
-using Texts = std::vector<std::string>;
+using testing::Texts;
+using testing::textsOf;
 
 struct Row {
     std::string_view text;
@@ -22,14 +24,6 @@ struct Row {
     Texts arguments;
     std::string_view rest;
 };
-
-[[nodiscard]] Texts textsOf(ArgumentList& arguments) {
-    Texts texts;
-    for (std::size_t index = 0; index < arguments.size(); ++index) {
-        texts.emplace_back(arguments[index].raw.joined());
-    }
-    return texts;
-}
 
 TEST(ArgumentSlices, AreTakenFromAList) {
     const std::vector<Row> table{

@@ -7,13 +7,15 @@
 
 #include <gtest/gtest.h>
 
+#include "support/argument_lists.h"
 #include "support/source_fixture.h"
 
 namespace umpre {
 namespace {
 
 using testing::SourceFixture;
-using Texts = std::vector<std::string>;
+using testing::Texts;
+using testing::textsOf;
 
 constexpr std::string_view kNotEnough = "There are not enough arguments in a macro invocation";
 constexpr std::string_view kTooMany = "A macro invocation has too many arguments";
@@ -25,14 +27,6 @@ struct ArgumentsFixture : SourceFixture {
     MacroTable macros;
     ArgumentCollector collector{sources, macros, reporter, lexer.texts()};
 };
-
-[[nodiscard]] Texts textsOf(ArgumentList& arguments) {
-    Texts texts;
-    for (std::size_t index = 0; index < arguments.size(); ++index) {
-        texts.emplace_back(arguments[index].raw.joined());
-    }
-    return texts;
-}
 
 struct Accepted {
     std::string_view text;

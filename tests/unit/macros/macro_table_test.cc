@@ -6,10 +6,13 @@
 
 #include <gtest/gtest.h>
 
+#include "support/macro_fixture.h"
+
 namespace umpre {
 namespace {
 
 using std::string_view_literals::operator""sv;
+using testing::definitionOf;
 using Definition = MacroTable::Definition;
 
 [[nodiscard]] MacroText objectLike(std::string_view text) {
@@ -18,12 +21,6 @@ using Definition = MacroTable::Definition;
 
 [[nodiscard]] MacroText functionLike(std::string_view text, std::string_view parameters) {
     return {text, parameters, true};
-}
-
-// Returns a defined name's text, or nothing.
-[[nodiscard]] std::string textOf(MacroTable& macros, std::string_view name) {
-    const MacroName* const found = macros.find(name);
-    return std::string(found == nullptr ? "(not defined)" : found->macro.text());
 }
 
 TEST(MacroTable, FindsNothingAtFirst) {
@@ -64,12 +61,12 @@ TEST(MacroTable, NamesAreBytes) {
     macros.define("", objectLike("empty"));
     macros.define("a\0"sv, objectLike("zero"));
     macros.define("a\0b"sv, objectLike("more"));
-    EXPECT_EQ(textOf(macros, "a"), "lower");
-    EXPECT_EQ(textOf(macros, "A"), "upper");
-    EXPECT_EQ(textOf(macros, ""), "empty");
-    EXPECT_EQ(textOf(macros, "a\0"sv), "zero");
-    EXPECT_EQ(textOf(macros, "a\0b"sv), "more");
-    EXPECT_EQ(textOf(macros, "a\0c"sv), "(not defined)");
+    EXPECT_EQ(definitionOf(macros, "a"), "lower");
+    EXPECT_EQ(definitionOf(macros, "A"), "upper");
+    EXPECT_EQ(definitionOf(macros, ""), "empty");
+    EXPECT_EQ(definitionOf(macros, "a\0"sv), "zero");
+    EXPECT_EQ(definitionOf(macros, "a\0b"sv), "more");
+    EXPECT_EQ(definitionOf(macros, "a\0c"sv), "(not defined)");
 }
 
 TEST(MacroTable, TheSameTextChangesNothing) {
@@ -84,7 +81,7 @@ TEST(MacroTable, AnotherTextReplacesTheWholeDefinition) {
     MacroTable macros;
     macros.define("F", functionLike("x", "x"));
     EXPECT_EQ(macros.define("F", objectLike("y")), Definition::Replaced);
-    EXPECT_EQ(textOf(macros, "F"), "y");
+    EXPECT_EQ(definitionOf(macros, "F"), "y");
     EXPECT_FALSE(macros.find("F")->macro.functionLike());
     EXPECT_EQ(macros.find("F")->macro.parameterCount(), 0);
 }
@@ -93,13 +90,13 @@ TEST(MacroTable, DefineMacroKeepsWhatIsDefined) {
     MacroTable macros;
     macros.defineMacro("A", "1");
     macros.defineMacro("A", "2");
-    EXPECT_EQ(textOf(macros, "A"), "1");
+    EXPECT_EQ(definitionOf(macros, "A"), "1");
 }
 
 TEST(MacroTable, DefineMacroTakesTheTextAsItIs) {
     MacroTable macros;
     macros.defineMacro("A", "  x   y ");
-    EXPECT_EQ(textOf(macros, "A"), "  x   y ");
+    EXPECT_EQ(definitionOf(macros, "A"), "  x   y ");
     EXPECT_FALSE(macros.find("A")->macro.functionLike());
 }
 
@@ -109,7 +106,7 @@ TEST(MacroTable, AnUndefinedNameIsNotFound) {
     macros.define("B", objectLike("2"));
     macros.undefine("A");
     EXPECT_EQ(macros.find("A"), nullptr);
-    EXPECT_EQ(textOf(macros, "B"), "2");
+    EXPECT_EQ(definitionOf(macros, "B"), "2");
 }
 
 TEST(MacroTable, UndefiningWhatIsNotDefinedDoesNothing) {
@@ -129,7 +126,7 @@ TEST(MacroTable, AnUndefinedNameCanBeDefinedAgain) {
     EXPECT_EQ(macros.define("A", objectLike("1")), Definition::Added);
     macros.undefine("A");
     macros.defineMacro("A", "3");
-    EXPECT_EQ(textOf(macros, "A"), "3");
+    EXPECT_EQ(definitionOf(macros, "A"), "3");
 }
 
 TEST(MacroTable, AnEntryStaysWhereItIs) {
@@ -153,11 +150,11 @@ TEST(MacroTable, ANameIsDefinedAnewInItsOwnBytes) {
     for (const std::string text : {"1", "", "9876543210abc", "a"}) {
         macros.undefine("A");
         EXPECT_EQ(macros.define("A", objectLike(text)), Definition::Added);
-        EXPECT_EQ(textOf(macros, "A"), text);
+        EXPECT_EQ(definitionOf(macros, "A"), text);
         EXPECT_EQ(macros.find("A")->macro.text().data(), bytes);
     }
     EXPECT_EQ(macros.define("A", objectLike("0123456789abcd")), Definition::Replaced);
-    EXPECT_EQ(textOf(macros, "A"), "0123456789abcd");
+    EXPECT_EQ(definitionOf(macros, "A"), "0123456789abcd");
 }
 
 TEST(MacroTable, DefinitionsDoNotTouchEachOther) {
@@ -166,10 +163,10 @@ TEST(MacroTable, DefinitionsDoNotTouchEachOther) {
     macros.define("F", functionLike("x", "x"));
     macros.define("A", objectLike("a longer one"));
     macros.define("B", objectLike("2"));
-    EXPECT_EQ(textOf(macros, "A"), "a longer one");
-    EXPECT_EQ(textOf(macros, "F"), "x");
+    EXPECT_EQ(definitionOf(macros, "A"), "a longer one");
+    EXPECT_EQ(definitionOf(macros, "F"), "x");
     EXPECT_EQ(macros.find("F")->macro.parameters(), "x");
-    EXPECT_EQ(textOf(macros, "B"), "2");
+    EXPECT_EQ(definitionOf(macros, "B"), "2");
 }
 
 TEST(MacroTable, HoldsThousandsOfNames) {
@@ -190,7 +187,7 @@ TEST(MacroTable, HoldsThousandsOfNames) {
         const std::string expected = number % 6 == 0   ? "again"
                                      : number % 3 == 0 ? "(not defined)"
                                                        : std::to_string(number);
-        EXPECT_EQ(textOf(macros, nameOf(number)), expected);
+        EXPECT_EQ(definitionOf(macros, nameOf(number)), expected);
     }
 }
 

@@ -7,6 +7,8 @@
 
 #include <gtest/gtest.h>
 
+#include "support/macro_fixture.h"
+
 namespace umpre {
 namespace {
 
@@ -14,8 +16,7 @@ struct PredefinedMacros : ::testing::Test {
     PredefinedMacros() { definePredefinedMacros(macros); }
 
     [[nodiscard]] std::string textOf(std::string_view name) {
-        const MacroName* const found = macros.find(name);
-        return std::string(found == nullptr ? "(not defined)" : found->macro.text());
+        return testing::definitionOf(macros, name);
     }
 
     // Returns a name's text after refreshing it.

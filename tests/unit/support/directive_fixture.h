@@ -22,10 +22,8 @@ struct DirectiveFixture : MacroFixture {
         return hash == TokenKind::HASH ? sources.next().kind : TokenKind::END_OF_INPUT;
     }
 
-    /// Returns a defined name's text, or a text that says that there is none.
     [[nodiscard]] std::string definition(std::string_view name) {
-        const MacroName* const found = macros.find(name);
-        return std::string(found == nullptr ? "(not defined)" : found->macro.text());
+        return definitionOf(macros, name);
     }
 };
 

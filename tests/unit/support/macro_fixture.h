@@ -20,6 +20,12 @@ struct Definition {
     std::string text;
 };
 
+/// Returns a defined name's text, or a text that says that there is none.
+[[nodiscard]] inline std::string definitionOf(MacroTable& macros, std::string_view name) {
+    const MacroName* const found = macros.find(name);
+    return std::string(found == nullptr ? "(not defined)" : found->macro.text());
+}
+
 /// Sources with macros.
 struct MacroFixture : SourceFixture {
     explicit MacroFixture(std::string_view text, const RunOptions& runOptions = {})
