@@ -9,11 +9,11 @@ umpre. With --build the example is built, which compiles what it needs, by the f
 import argparse
 import pathlib
 import shutil
-import subprocess
 import sys
 import tempfile
 
 from build_systems import EXAMPLE, ROOT, block
+from installed import run
 
 HEADING = "With the sources of umpre"
 CHECKS = """
@@ -25,14 +25,6 @@ if(UMPRE_TESTS OR UMPRE_INSTALL OR CMAKE_RUNTIME_OUTPUT_DIRECTORY OR CMAKE_CXX_S
 endif()
 enable_testing()
 """
-
-
-def run(*command, **options):
-    """Runs a command that must succeed. Returns what it printed."""
-    done = subprocess.run(command, capture_output=True, text=True, **options)
-    if done.returncode != 0:
-        sys.exit(f"{command}\n{done.stdout}{done.stderr}")
-    return done.stdout
 
 
 def expect(what, good, output=""):
