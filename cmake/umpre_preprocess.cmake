@@ -14,13 +14,17 @@ function(umpre_preprocess)
     cmake_parse_arguments(PARSE_ARGV 0 arg "" "TARGET;OUTPUT_EXTENSION"
         "SOURCES;DEFINES;INCLUDE_DIRECTORIES")
     if(NOT arg_TARGET OR NOT arg_SOURCES OR arg_UNPARSED_ARGUMENTS)
-        message(FATAL_ERROR "umpre_preprocess(TARGET target SOURCES source... [DEFINES definition...] "
-            "[INCLUDE_DIRECTORIES directory...] [OUTPUT_EXTENSION extension])")
+        message(FATAL_ERROR "umpre_preprocess(TARGET target SOURCES source... "
+            "[DEFINES definition...] [INCLUDE_DIRECTORIES directory...] "
+            "[OUTPUT_EXTENSION extension])")
     endif()
     if(NOT arg_OUTPUT_EXTENSION)
         set(arg_OUTPUT_EXTENSION .i)
     endif()
-    set(options)
+    # The caller may have variables of these names.
+    set(options "")
+    set(outputs "")
+    set(stamps "")
     foreach(definition IN LISTS arg_DEFINES)
         list(APPEND options "-D${definition}")
     endforeach()

@@ -24,6 +24,15 @@ if(UMPRE_TESTS OR UMPRE_INSTALL OR CMAKE_RUNTIME_OUTPUT_DIRECTORY OR CMAKE_CXX_S
     message(FATAL_ERROR "umpre changed the project's settings")
 endif()
 enable_testing()
+set(outputs mine)
+set(stamps mine)
+"""
+CHECKS_BEHIND = """
+get_target_property(files texts UMPRE_OUTPUTS)
+set(here ${CMAKE_CURRENT_BINARY_DIR})
+if(NOT files STREQUAL "${here}/leds.txt;${here}/clock.txt")
+    message(FATAL_ERROR "the texts are ${files}")
+endif()
 """
 
 
@@ -41,7 +50,7 @@ def project_with(way, folder):
     rules = block("CMake").replace("LANGUAGES NONE", "LANGUAGES CXX")
     find = "find_package(umpre 1.0 REQUIRED)\n"
     assert find in rules
-    (folder / "CMakeLists.txt").write_text(rules.replace(find, way + CHECKS))
+    (folder / "CMakeLists.txt").write_text(rules.replace(find, way + CHECKS) + CHECKS_BEHIND)
 
 
 def check(cmake, source, build):
