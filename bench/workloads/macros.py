@@ -1,9 +1,7 @@
 # SPDX-License-Identifier: MIT
-"""Workloads that define and use macros, and one of what is hard to read."""
+"""Workloads that define and use macros."""
 
 from .words import Writer
-
-MB = 1_000_000
 
 
 def register_macros(writer, count):
