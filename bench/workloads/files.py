@@ -9,7 +9,7 @@ MB = 1_000_000
 def includes(folder, rng, scale):
     """Inclusions of 600 small guarded headers in three search folders, deep and wide."""
     writer = Writer(rng, 2000)
-    levels, wide = 20, 30
+    levels, wide = 20, max(1, round(30 * scale))
     names = [f"part{n:03}.h" for n in range(levels * wide)]
     places = {name: f"inc{rng.randrange(3)}" for name in names}
     for n, name in enumerate(names):
@@ -97,7 +97,7 @@ READINGS = (
 def reinclude(folder, rng, scale):
     """Definition lists included again and again, each time with other macros."""
     writer = Writer(rng)
-    lists = [f"list{n:02}.def" for n in range(40)]
+    lists = [f"list{n:02}.def" for n in range(max(1, round(40 * scale)))]
     size = 0
     for number, name in enumerate(lists):
         text = definition_list(writer, number)

@@ -135,7 +135,7 @@ def conditions(folder, rng, scale):
     """Chains of #if and #elif with arithmetic and `defined`; 95 % of the text is skipped."""
     writer = Writer(rng)
     expressions = Expressions(rng)
-    true, false = expressions.sorted_by_value(2000)
+    true, false = expressions.sorted_by_value(max(20, round(2000 * scale)))
     lines = Pool(rng, writer.code_lines(5000))
     bodies = [lines.text(rng.uniform(180, 540)) for _ in range(2000)]
     text = [expressions.definitions()]
