@@ -41,7 +41,7 @@ private:
 int write(const std::string& name, std::string_view text, umpre::ByteSink& errors) {
     umpre::OutputFile file("umpre-deps");
     if (!name.empty() && name != "-" && !file.open(name)) {
-        (void)errors.write("umpre-deps: cannot open output file '" + name + "'\n");
+        (void)errors.write(file.openFailureMessage(name));
         return 1;
     }
     (void)file.write(text);
@@ -68,8 +68,9 @@ int writeRule(const umpre::DepsOptions& options, umpre::Rule rule, umpre::ByteSi
 
 int preprocess(const umpre::DepsOptions& options, umpre::ByteSink& errors) {
     umpre::OutputFile output("umpre-deps");
-    if (options.outputName.empty() && !output.open("/dev/null")) {
-        (void)errors.write("umpre-deps: cannot open output file '/dev/null'\n");
+    if (const std::string nowhere = "/dev/null";
+        options.outputName.empty() && !output.open(nowhere)) {
+        (void)errors.write(output.openFailureMessage(nowhere));
         return 1;
     }
     Names files;

@@ -100,7 +100,7 @@ bool takeOutputFile(const OptionParser& options, const Console& console) {
     }
     const std::string name(*word);
     if (!console.output.open(name)) {
-        (void)console.errors.write(prefixOf(console) + "cannot open output file '" + name + "'\n");
+        (void)console.errors.write(console.output.openFailureMessage(name));
         return false;
     }
     return true;

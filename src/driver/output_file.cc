@@ -43,4 +43,8 @@ std::string OutputFile::failureMessage() const {
                          : program + ": cannot write output file '" + name_ + "'\n";
 }
 
+std::string OutputFile::openFailureMessage(const std::string& name) const {
+    return std::string(program_) + ": cannot open output file '" + name + "'\n";
+}
+
 }  // namespace umpre

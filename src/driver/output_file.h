@@ -13,7 +13,7 @@ namespace umpre {
 /// Where the result goes: standard output, or the file that took its place.
 class OutputFile final : public ByteSink {
 public:
-    /// The name of the program stands in front of its message.
+    /// The name of the program stands in front of its messages.
     explicit OutputFile(std::string_view program = "umpre") noexcept : program_(program) {}
 
     OutputFile(const OutputFile&) = delete;
@@ -29,6 +29,8 @@ public:
     [[nodiscard]] bool close();
     /// Returns what to say when something has not.
     [[nodiscard]] std::string failureMessage() const;
+    /// Returns what to say when a file of this name cannot be opened.
+    [[nodiscard]] std::string openFailureMessage(const std::string& name) const;
 
 private:
     std::string_view program_;

@@ -50,8 +50,8 @@ template <typename Number>
     return static_cast<std::uint32_t>(hash * kFactor >> 32U);
 }
 
-/// Tells whether two names are the same; for short ones, a call would take longer.
-[[nodiscard]] inline bool areSame(std::string_view name, std::string_view other) noexcept {
+/// Tells whether two names are the same. For short ones, a call would take longer.
+[[nodiscard]] inline bool isSameName(std::string_view name, std::string_view other) noexcept {
     const std::size_t size = name.size();
     if (size != other.size()) {
         return false;
@@ -120,11 +120,9 @@ private:
 
     // Of the first eight bytes of a name, its last eight and its size.
     [[nodiscard]] static std::uint32_t hashOf(std::string_view name) noexcept {
-        std::uint64_t first = 0;
-        std::uint64_t last = 0;
-        std::memcpy(&first, name.data(), kChunk);
         const std::size_t behind = name.size() > kChunk ? name.size() - kChunk : 0;
-        std::memcpy(&last, name.data() + behind, kChunk);
+        const auto first = bytesAt<std::uint64_t>(name.data());
+        const auto last = bytesAt<std::uint64_t>(name.data() + behind);
         const std::uint64_t mask = kFirstBytes[name.size() < kChunk ? name.size() : kChunk];
         const std::uint64_t sum = (first & mask) + std::rotl(last & mask, 32) + name.size();
         return static_cast<std::uint32_t>(sum * 0x9E3779B97F4A7C15U >> 32U);

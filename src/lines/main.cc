@@ -88,7 +88,7 @@ std::string convert(const umpre::LinesOptions& options, umpre::OutputFile& file)
             return "umpre-lines: '" + result + "' would overwrite what it is made from\n";
         }
         if (!file.open(result)) {
-            return "umpre-lines: cannot open output file '" + result + "'\n";
+            return file.openFailureMessage(result);
         }
     }
     umpre::OutputWriter output;

@@ -29,7 +29,7 @@ using enum TokenKind;
 NameReader::Outcome MacroExpander::readName(std::string_view name, const char* end) {
     const char* const behind = name.data() + name.size();
     // Lists call one macro again and again.
-    if (lastRead_ == nullptr || !areSame(lastRead_->text, name) || !lastRead_->isDefined) {
+    if (lastRead_ == nullptr || !isSameName(lastRead_->text, name) || !lastRead_->isDefined) {
         lastRead_ = macros_.find(name);
         if (lastRead_ == nullptr) {
             return {name, behind};

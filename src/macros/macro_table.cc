@@ -168,7 +168,7 @@ inline std::size_t MacroTable::slotOf(std::string_view name, std::uint32_t hash)
 bool MacroTable::holds(Slot slot, std::string_view name) {
     const MacroName& entry = nameIn(slot);
     __builtin_prefetch(&entry.macro);
-    return areSame(entry.text, name);
+    return isSameName(entry.text, name);
 }
 
 MacroName& MacroTable::enter(std::string_view name) {

@@ -115,12 +115,12 @@ TEST(NameFilter, HashesByTheBytesAlone) {
 TEST(NameFilter, EveryByteOfANameMatters) {
     for (std::size_t size = 0; size <= 40; ++size) {
         const std::string name(size, 'a');
-        EXPECT_TRUE(areSame(name, std::string(size, 'a'))) << size;
-        EXPECT_FALSE(areSame(name, std::string(size + 1, 'a'))) << size;
+        EXPECT_TRUE(isSameName(name, std::string(size, 'a'))) << size;
+        EXPECT_FALSE(isSameName(name, std::string(size + 1, 'a'))) << size;
         for (std::size_t place = 0; place < size; ++place) {
             std::string other = name;
             other[place] = 'b';
-            EXPECT_FALSE(areSame(name, other)) << size << ' ' << place;
+            EXPECT_FALSE(isSameName(name, other)) << size << ' ' << place;
             EXPECT_NE(hashOfName(name), hashOfName(other)) << size << ' ' << place;
         }
     }
