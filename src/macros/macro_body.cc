@@ -179,16 +179,23 @@ private:
         if (!held_) {
             return;
         }
-        const BodyOperand& operand = body_.operands[held_->firstOperand];
         if (held_->isJoined) {
             body_.steps.push_back(
                 {BodyStep::Kind::Joined, held_->firstOperand, body_.operands.size()});
-        } else if (operand.kind == BodyOperand::Kind::Token) {
+        } else {
+            writeAlone(body_.operands.back());
+            body_.operands.pop_back();
+        }
+        held_.reset();
+    }
+
+    // Puts an operand that is not joined into the replacement.
+    void writeAlone(const BodyOperand& operand) {
+        if (operand.kind == BodyOperand::Kind::Token) {
             writeLastToken();
         } else {
             body_.steps.push_back({BodyStep::Kind::Argument, operand.index, 0});
         }
-        held_.reset();
     }
 
     // Puts the token last added to the body's own into the replacement.

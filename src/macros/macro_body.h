@@ -56,8 +56,8 @@ struct MacroBody {
     // For function-like macros only:
     SharedText source;  // the text as lexed, if reading it has effects
     std::vector<BodyStep> steps;
-    std::vector<BodyOperand> operands;
-    std::vector<const Name*> names;  // of the tokens that stay as they are
+    std::vector<BodyOperand> operands;  // of the steps that join
+    std::vector<const Name*> names;     // of the tokens that stay as they are
     /// Replacing is a matter of the bytes of this body and the arguments alone.
     bool isPlain = false;
     // Whether `names` holds one of a macro, as of so many changes of the table.

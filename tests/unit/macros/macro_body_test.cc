@@ -98,6 +98,13 @@ TEST(MacroBody, OfAnObjectLikeMacroIsItsTokens) {
                                 {IDENTIFIER, "x"}}));
 }
 
+TEST(MacroBody, OnlyWhatIsJoinedIsKeptAsOperands) {
+    TextLexer lexer;
+    MacroTable macros;
+    const Macro& macro = defined(macros, {"a x + y x ## 1 b #y (x) c ## d e", "x,y", true});
+    EXPECT_EQ(BodyMaker(lexer, macros).bodyOf(macro).operands.size(), 5U);
+}
+
 TEST(MacroBody, OfAnObjectLikeMacroIsKeptFromTheSecondUseOn) {
     TextLexer lexer;
     MacroTable macros;
