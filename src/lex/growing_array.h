@@ -84,9 +84,17 @@ private:
         std::swap(capacity_, other.capacity_);
     }
 
+    // A large array grows by less, and has the pages at once that it grows by.
     void grow(std::size_t needed) {
         constexpr std::size_t kFirst = 32 / sizeof(Element);
-        setCapacity(std::max({needed, 2 * capacity_, kFirst}));
+        constexpr std::size_t kLarge = (std::size_t{256} << 10U) / sizeof(Element);
+        if (needed < kLarge) {
+            setCapacity(std::max({needed, 2 * capacity_, kFirst}));
+            return;
+        }
+        const std::size_t before = capacity_;
+        setCapacity(needed + needed / 4);
+        requestPages(elements_.get() + before, (capacity_ - before) * sizeof(Element));
     }
 
     // A large array grows where its pages are: nothing is copied.

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "lex/growing_array.h"
 
+#include <numeric>
 #include <utility>
 
 #include <gtest/gtest.h>
@@ -25,6 +26,19 @@ TEST(GrowingArray, GrowsBySeveralElementsAtATime) {
     added[99] = 'z';
     EXPECT_EQ(array.size(), 100U);
     EXPECT_EQ(array[99], 'z');
+}
+
+TEST(GrowingArray, KeepsWhatWasWrittenWhileItIsLarge) {
+    GrowingArray<int> array;
+    constexpr int kGroup = 10000;
+    constexpr int kGroups = 100;
+    for (int group = 0; group < kGroups; ++group) {
+        int* const added = array.extend(kGroup);
+        std::iota(added, added + kGroup, group * kGroup);
+    }
+    for (int value = 0; value < kGroups * kGroup; ++value) {
+        ASSERT_EQ(array[static_cast<std::size_t>(value)], value);
+    }
 }
 
 TEST(GrowingArray, IsEmptyAfterBeingCleared) {
