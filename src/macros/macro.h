@@ -2,7 +2,6 @@
 #ifndef UMPRE_MACROS_MACRO_H
 #define UMPRE_MACROS_MACRO_H
 
-#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <memory>
@@ -85,12 +84,10 @@ struct Expansion {
     std::string_view text;
 };
 
-/// A name that was defined at least once, and its last definition. Large inputs use names that lie
-/// far apart, so what a use in text looks at stands in two cache lines that follow each other.
-struct alignas(64) MacroName : Name {
+/// A name that was defined at least once, and its last definition. Its bytes follow it: large
+/// inputs use names that lie far apart, so what a use in text looks at stands together.
+struct MacroName : Name {
     mutable Expansion expansion;
-    /// The bytes of a name that they suffice for.
-    std::array<char, 32> shortName{};
     Macro macro;
 };
 

@@ -7,6 +7,7 @@
 #include "macros/macro_table.h"
 
 #include <algorithm>
+#include <iterator>
 #include <new>
 
 #include "lex/page_request.h"
@@ -16,6 +17,11 @@ namespace {
 
 constexpr std::size_t kFirstSlots = 256;
 
+// Readers of names look at eight bytes at a time, so that many can be read behind the last.
+constexpr std::size_t kReadable = 8;
+
+constexpr std::size_t kCacheLine = 64;
+
 // Counts the names in a text like "a,b".
 [[nodiscard]] std::uint32_t countOf(std::string_view names) noexcept {
     const auto commas = std::count(names.begin(), names.end(), ',');
@@ -24,7 +30,7 @@ constexpr std::size_t kFirstSlots = 256;
 
 }  // namespace
 
-MacroTable::MacroTable() : slots_(kFirstSlots), unknown_(1) {}
+MacroTable::MacroTable() : slots_(kFirstSlots, &pages_), unknown_(1) {}
 
 MacroName* MacroTable::find(std::string_view name) {
     MacroName* const entry = findEntry(name);
@@ -133,10 +139,14 @@ void MacroTable::undefine(std::string_view name) {
 
 void MacroTable::setEvents(MacroEvents& events) {
     events_ = &events;
-    for (std::uint32_t number = 1; number <= nameCount_; ++number) {
-        const MacroName& name = nameIn({0, number});
-        if (name.isDefined) {
-            tellDefined(name);
+    std::vector<Slot> taken;
+    std::copy_if(slots_.begin(), slots_.end(), std::back_inserter(taken),
+                 [](Slot slot) { return slot.number != 0; });
+    std::sort(taken.begin(), taken.end(),
+              [](Slot slot, Slot other) { return slot.number < other.number; });
+    for (const Slot slot : taken) {
+        if (nameIn(slot).isDefined) {
+            tellDefined(nameIn(slot));
         }
     }
 }
@@ -163,11 +173,12 @@ inline std::size_t MacroTable::slotOf(std::string_view name, std::uint32_t hash)
     return at;
 }
 
-// Tells whether a slot is that of a name. Both cache lines that this looks at are asked for at
-// once.
+// Tells whether a slot is that of a name. What a use looks at is asked for at once.
 bool MacroTable::holds(Slot slot, std::string_view name) {
     const MacroName& entry = nameIn(slot);
-    __builtin_prefetch(&entry.macro);
+    const auto* const place = static_cast<const char*>(static_cast<const void*>(&entry));
+    __builtin_prefetch(place + kCacheLine);
+    __builtin_prefetch(place + 2 * kCacheLine);
     return isSameName(entry.text, name);
 }
 
@@ -179,28 +190,40 @@ MacroName& MacroTable::enter(std::string_view name) {
             grow();
             at = slotOf(name, hash);
         }
-        slots_[at] = {hash, static_cast<std::uint32_t>(++nameCount_)};
-        MacroName& added = newName();
-        char* const bytes =
-            name.size() <= added.shortName.size() ? added.shortName.data() : newBytes(name.size());
-        added.text = {bytes, name.copy(bytes, name.size())};
+        slots_[at] = {hash, newName(name)};
+        ++nameCount_;
     }
     return nameIn(slots_[at]);
 }
 
-MacroName& MacroTable::newName() {
-    const std::size_t place = (nameCount_ - 1) % kNamesTogether;
-    if (place == 0) {
-        void* const block = newBlock(kNamesTogether * sizeof(MacroName), alignof(MacroName));
-        names_.push_back(static_cast<MacroName*>(block));
+// Makes the entry of a name and returns its number.
+std::uint32_t MacroTable::newName(std::string_view name) {
+    const std::size_t units = (sizeof(MacroName) + name.size() + kUnit - 1) / kUnit;
+    if (units > kUnitsTogether - unitsTaken_) {
+        addNames(units);
     }
-    return *new (names_.back() + place) MacroName();
+    const std::size_t number = (names_.size() - 1) * kUnitsTogether + unitsTaken_ + 1;
+    char* const place = names_.back() + unitsTaken_ * kUnit;
+    char* const bytes = place + sizeof(MacroName);
+    auto* const added = new (place) MacroName();
+    added->text = {bytes, name.copy(bytes, name.size())};
+    unitsTaken_ += std::min(units, kUnitsTogether);
+    return static_cast<std::uint32_t>(number);
 }
 
-// Readers of names look at eight bytes at a time, so that many can be read behind the last.
+// Takes memory for names, of which the first one takes so many units.
+void MacroTable::addNames(std::size_t units) {
+    constexpr std::size_t kMostBlocks = UINT32_MAX / kUnitsTogether;
+    if (names_.size() == kMostBlocks) {
+        throw std::bad_alloc();
+    }
+    const std::size_t size = std::max(units, kUnitsTogether) * kUnit + kReadable;
+    names_.push_back(static_cast<char*>(newBlock(size, kUnit)));
+    unitsTaken_ = 0;
+}
+
 char* MacroTable::newBytes(std::size_t size) {
     constexpr std::size_t kBlock = std::size_t{32} * 1024;
-    constexpr std::size_t kReadable = 8;
     if (size + kReadable > left_) {
         left_ = std::max(size + kReadable, kBlock);
         free_ = static_cast<char*>(newBlock(left_, 1));
@@ -229,7 +252,7 @@ void MacroTable::dropUse(const Macro& macro) noexcept {
 }
 
 void MacroTable::grow() {
-    std::vector<Slot> old;
+    std::pmr::vector<Slot> old(&pages_);
     old.reserve(2 * slots_.size());
     requestPages(old.data(), 2 * slots_.size() * sizeof(Slot));
     old.resize(2 * slots_.size());

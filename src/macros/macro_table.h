@@ -11,6 +11,7 @@
 
 #include "lex/lexed_text.h"
 #include "lex/name_filter.h"
+#include "macros/large_pages.h"
 #include "macros/macro.h"
 #include "macros/macro_events.h"
 
@@ -97,19 +98,24 @@ public:
 private:
     struct Slot {
         std::uint32_t hash = 0;
-        std::uint32_t number = 0;  // of the name, counted from 1; 0: free
+        std::uint32_t number = 0;  // of the name; 0: free
     };
 
-    static constexpr std::size_t kNamesTogether = 256;
+    // A name's number tells where it stands: how many units from the first one, counted from 1.
+    static constexpr std::size_t kUnit = alignof(MacroName);
+    static constexpr std::size_t kUnitsTogether = 4096;
 
     [[nodiscard]] MacroName& nameIn(Slot slot) noexcept {
-        return names_[(slot.number - 1) / kNamesTogether][(slot.number - 1) % kNamesTogether];
+        const std::size_t unit = slot.number - 1;
+        void* const place = names_[unit / kUnitsTogether] + unit % kUnitsTogether * kUnit;
+        return *static_cast<MacroName*>(place);
     }
 
     [[nodiscard]] std::size_t slotOf(std::string_view name, std::uint32_t hash);
     [[nodiscard]] bool holds(Slot slot, std::string_view name);
     [[nodiscard]] MacroName& enter(std::string_view name);
-    [[nodiscard]] MacroName& newName();
+    [[nodiscard]] std::uint32_t newName(std::string_view name);
+    void addNames(std::size_t units);
     [[nodiscard]] char* newBytes(std::size_t size);
     [[nodiscard]] void* newBlock(std::size_t size, std::size_t alignment);
     static void dropUse(const Macro& macro) noexcept;
@@ -118,14 +124,16 @@ private:
     void tellDefined(const MacroName& name);
     void grow();
 
-    std::pmr::monotonic_buffer_resource bytes_;  // of names and definitions
-    char* free_ = nullptr;                       // the rest of the last block
+    LargePages pages_;
+    std::pmr::monotonic_buffer_resource bytes_{&pages_};  // of names and definitions
+    char* free_ = nullptr;                                // the rest of the last block
     std::size_t left_ = 0;
-    std::size_t blockBytes_ = 0;     // of all blocks
-    std::vector<MacroName*> names_;  // arrays of `kNamesTogether`
+    std::size_t blockBytes_ = 0;  // of all blocks
+    std::vector<char*> names_;    // blocks of `kUnitsTogether`, or of one name with more
+    std::size_t unitsTaken_ = kUnitsTogether;  // of the last block
     std::deque<MacroUse> uses_;
     std::size_t nameCount_ = 0;
-    std::vector<Slot> slots_;  // open addressing; at most three of four are taken
+    std::pmr::vector<Slot> slots_;  // open addressing; at most three of four are taken
     NameFilter filter_;
     NameFilter watched_;  // by readers of definitions
     std::uint64_t version_ = 1;

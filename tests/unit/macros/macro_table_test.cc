@@ -3,6 +3,7 @@
 
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include <gtest/gtest.h>
 
@@ -22,6 +23,20 @@ using Definition = MacroTable::Definition;
 [[nodiscard]] MacroText functionLike(std::string_view text, std::string_view parameters) {
     return {text, parameters, true};
 }
+
+// Writes what it is told.
+class RecordingMacroEvents final : public MacroEvents {
+public:
+    void macroDefined(std::string_view name) override { told.append("+").append(name); }
+
+    void macroUndefined(std::string_view name) override { told.append("-").append(name); }
+
+    void macroMet() override { told.append("?"); }
+
+    void macroExpanded(std::string_view name) override { told.append("!").append(name); }
+
+    std::string told;
+};
 
 TEST(MacroTable, FindsNothingAtFirst) {
     MacroTable macros;
@@ -191,6 +206,24 @@ TEST(MacroTable, HoldsThousandsOfNames) {
     }
 }
 
+TEST(MacroTable, HoldsNamesOfAllSizes) {
+    MacroTable macros;
+    std::vector<std::string> names;
+    for (const int size : {1, 7, 8, 9, 32, 33, 32000, 1, 32672, 32673, 2, 100000, 3, 4}) {
+        names.push_back(std::to_string(names.size()).append(static_cast<std::size_t>(size), 'n'));
+        macros.define(names.back(), objectLike("is " + std::to_string(size)));
+    }
+    std::string inOrder;
+    for (const std::string& name : names) {
+        EXPECT_EQ(macros.find(name)->text, name);
+        EXPECT_EQ(definitionOf(macros, name), "is " + std::to_string(name.size() - name.find('n')));
+        inOrder.append("+").append(name);
+    }
+    RecordingMacroEvents events;
+    macros.setEvents(events);
+    EXPECT_EQ(events.told, inOrder);
+}
+
 TEST(MacroTable, EveryDefinedNamePassesTheFilter) {
     MacroTable macros;
     for (int number = 0; number < 2000; ++number) {
@@ -214,20 +247,6 @@ TEST(MacroTable, TheFilterStopsNamesNeverDefined) {
     EXPECT_FALSE(macros.filter().mayHold("a"));
     EXPECT_FALSE(macros.filter().mayHold("anything"));
 }
-
-// Writes what it is told.
-class RecordingMacroEvents final : public MacroEvents {
-public:
-    void macroDefined(std::string_view name) override { told.append("+").append(name); }
-
-    void macroUndefined(std::string_view name) override { told.append("-").append(name); }
-
-    void macroMet() override { told.append("?"); }
-
-    void macroExpanded(std::string_view name) override { told.append("!").append(name); }
-
-    std::string told;
-};
 
 TEST(MacroTable, TellsOfChangesOfDefinitions) {
     MacroTable macros;
