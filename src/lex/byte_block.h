@@ -168,9 +168,12 @@ using ByteBlock = BasicByteBlock<BaseVector>;
     return static_cast<unsigned>(std::countr_zero(mask));
 }
 
-/// Returns the mask of the places below `place`, which is at most 64.
+/// Returns the mask of the places below `place`. Without a branch: whether the place is one of the
+/// 64 often cannot be predicted.
 [[nodiscard]] inline ByteBlock::Mask bitsBelow(std::size_t place) noexcept {
-    return place >= ByteBlock::kSize ? ~ByteBlock::Mask{0} : (ByteBlock::Mask{1} << place) - 1;
+    using Mask = ByteBlock::Mask;
+    const Mask all = Mask{0} - static_cast<Mask>(place >= ByteBlock::kSize);
+    return ((Mask{1} << place % ByteBlock::kSize) - 1) | all;
 }
 
 /// Returns how many bits a mask has. Not every processor of the kind has an instruction for it, and

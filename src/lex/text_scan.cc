@@ -118,16 +118,16 @@ TextScan::Block TextScan::blockAt(const char* at) {
     // What stands before these 64 bytes is not known here.
     const Mask blanks = block.bytes.blanksAndUnusual() & ~block.lineFeeds;
     const Mask suspects = marksLineFeeds_ ? ~Mask{0} : blanks << 1U | 1U;
-    const Mask escapedQuote = !goesOn && *at == '"' && at[-1] == '\\' ? 1 : 0;
+    const Mask escapedQuote = Mask{!goesOn} & Mask{*at == '"'} & Mask{at[-1] == '\\'};
     block.unusual = (((window.special | (block.lineFeeds & suspects)) & ~block.strings)
                      | (window.lineEnds & block.strings) | escapedQuote)
                     & inside;
     block.stop = block.size;
     block.next = at + block.size;
-    if (block.size != 0 && block.isInString(block.size - 1)) {
-        const unsigned size = block.stringBytesUpTo(block.size - 1);
-        block.openQuote = size == block.size && goesOn ? openQuote_ : block.next - size;
-    }
+    const unsigned inString = block.stringBytesUpTo((block.size - 1) % ByteBlock::kSize);
+    const char* const quote = inString == block.size ? openQuote_ : nullptr;
+    const char* const opened = quote == nullptr ? block.next - inString : quote;
+    block.openQuote = inString == 0 ? nullptr : opened;
     return block;
 }
 
