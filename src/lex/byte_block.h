@@ -143,7 +143,7 @@ private:
 
     // Comparisons are signed: the range is moved to where the smallest numbers are.
     template <char kFirst, int kCount>
-    [[nodiscard]] static Part within(Part part) noexcept {
+    [[nodiscard]] static auto within(Part part) noexcept {
         const Part moved =
             Vector::difference(part, Vector::all(static_cast<char>(kFirst + INT8_MIN)));
         return Vector::less(moved, Vector::all(INT8_MIN + kCount));

@@ -106,7 +106,7 @@ void TextMap::findPart(const char* bytes, std::size_t size, BytesBefore& before,
                        TextMasks& masks) const {
     std::array<char, ByteBlock::kSize> part{};
     std::memcpy(part.data(), bytes, size);
-    finder_(part.data(), 1, before, &masks);
+    finder_.findText(part.data(), 1, before, &masks);
 }
 
 // Finds the masks from begin_ on. Of what stands behind the end they tell nothing.
@@ -118,7 +118,7 @@ void TextMap::findMasks(const char* end) {
         masks_.resize(whole + 2);
     }
     TextMasks* behind = masks_.data() + whole;
-    finder_(begin_, whole, before_, masks_.data());
+    finder_.findText(begin_, whole, before_, masks_.data());
     if (rest != 0) {
         findPart(begin_ + whole * ByteBlock::kSize, rest, before_, *behind++);
     }

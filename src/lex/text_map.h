@@ -68,6 +68,9 @@ public:
     /// they do not tell.
     [[nodiscard]] Comment commentAt(const char* comment, const char* end);
 
+    /// Returns the finder that the masks are found with.
+    [[nodiscard]] const TextMaskFinder& finder() const noexcept { return finder_; }
+
     /// The masks of 64 bytes that begin anywhere. What stands behind the end is not told.
     struct Window {
         Mask lineFeeds;
@@ -121,7 +124,7 @@ private:
     void findPart(const char* bytes, std::size_t size, BytesBefore& before, TextMasks& masks) const;
     void findMasks(const char* end);
 
-    TextMaskFinder finder_ = textMaskFinder();
+    const TextMaskFinder& finder_ = textMaskFinder();
     const char* begin_ = nullptr;  // of what is known
     std::size_t size_ = 0;
     BytesBefore before_;     // what follows

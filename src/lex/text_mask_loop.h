@@ -9,13 +9,20 @@
 
 namespace umpre {
 
-/// The work of a TextMaskFinder with one kind of vectors. If only some processors have these, the
-/// kind must be a type of one source file: then nothing that is made of it here is shared with
-/// other files. No function that others share may be called.
+/// A TextMaskFinder with one kind of vectors. If only some processors have these, the kind must be
+/// a type of one source file: then nothing that is made of it here is shared with other files. No
+/// function that others share may be called.
 template <typename Vector>
 class TextMaskLoop {
 public:
-    static void find(const char* bytes, std::size_t count, BytesBefore& before, TextMasks* masks) {
+    static const TextMaskFinder kFinder;
+
+private:
+    using Block = BasicByteBlock<Vector>;
+    using Mask = TextMasks::Mask;
+
+    static void findText(const char* bytes, std::size_t count, BytesBefore& before,
+                         TextMasks* masks) {
         TextMaskLoop loop(before);
         for (std::size_t index = 0; index < count; ++index) {
             loop.findIn(bytes + index * Block::kSize, masks[index]);
@@ -23,9 +30,17 @@ public:
         before = {loop.lineFeeds_, loop.behindStar_ != 0, loop.escape_ != 0};
     }
 
-private:
-    using Block = BasicByteBlock<Vector>;
-    using Mask = TextMasks::Mask;
+    [[nodiscard]] static WordMasks wordsIn(const char* bytes) {
+        const Block block(bytes);
+        return {block.letters(), block.digits(), block.blanksAndUnusual()};
+    }
+
+    [[nodiscard]] static NumberMasks numbersIn(const char* bytes) {
+        const Block block(bytes);
+        const Block lower = block.lower();
+        return {block.any('0'), lower.any('x'), lower.any('u'), lower.any('l'),
+                lower.template firstLetters<6>()};
+    }
 
     static constexpr unsigned kLast = Block::kSize - 1;
 
@@ -73,6 +88,9 @@ private:
     Mask behindStar_;
     Mask escape_;
 };
+
+template <typename Vector>
+constexpr TextMaskFinder TextMaskLoop<Vector>::kFinder{findText, wordsIn, numbersIn};
 
 }  // namespace umpre
 

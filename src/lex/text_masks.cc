@@ -43,19 +43,19 @@ namespace {
 }
 #endif
 
-[[nodiscard]] TextMaskFinder fastestFinder() noexcept {
-    const TextMaskFinder widest = widestTextMaskFinder();
+[[nodiscard]] const TextMaskFinder& fastestFinder() noexcept {
+    const TextMaskFinder* const widest = widestTextMaskFinder();
     if (widest != nullptr && hasWidestVectors()) {
-        return widest;
+        return *widest;
     }
-    const TextMaskFinder wide = wideTextMaskFinder();
-    return wide != nullptr && hasWideVectors() ? wide : baseTextMaskFinder();
+    const TextMaskFinder* const wide = wideTextMaskFinder();
+    return wide != nullptr && hasWideVectors() ? *wide : baseTextMaskFinder();
 }
 
 }  // namespace
 
-TextMaskFinder textMaskFinder() noexcept {
-    static const TextMaskFinder finder = fastestFinder();
+const TextMaskFinder& textMaskFinder() noexcept {
+    static const TextMaskFinder& finder = fastestFinder();
     return finder;
 }
 

@@ -33,23 +33,45 @@ struct BytesBefore {
     bool escape = false;  ///< they end with a backslash that is not escaped
 };
 
-/// Finds the masks of `count` blocks of 64 bytes that follow each other. Makes of `before` what is
-/// to be known of the bytes before those that follow.
-using TextMaskFinder = void (*)(const char* bytes, std::size_t count, BytesBefore& before,
-                                TextMasks* masks);
+/// Where words stand among 64 bytes.
+struct WordMasks {
+    TextMasks::Mask letters;  ///< ASCII letters and underscores
+    TextMasks::Mask digits;
+    TextMasks::Mask blanksAndUnusual;  ///< blanks, control characters and bytes above 127
+};
+
+/// Where among 64 bytes stands what numbers are told by, of letters both cases.
+struct NumberMasks {
+    TextMasks::Mask zeros;
+    TextMasks::Mask xs;
+    TextMasks::Mask us;
+    TextMasks::Mask ls;
+    TextMasks::Mask hexLetters;  ///< A to F
+};
+
+/// The functions that find masks with one kind of vectors.
+struct TextMaskFinder {
+    /// Finds the masks of `count` blocks of 64 bytes that follow each other. Makes of `before` what
+    /// is to be known of the bytes before those that follow.
+    void (*findText)(const char* bytes, std::size_t count, BytesBefore& before, TextMasks* masks);
+
+    /// Returns the masks of 64 bytes.
+    WordMasks (*wordsIn)(const char* bytes);
+    NumberMasks (*numbersIn)(const char* bytes);
+};
 
 /// Returns the finder that is the fastest one on this processor.
-[[nodiscard]] TextMaskFinder textMaskFinder() noexcept;
+[[nodiscard]] const TextMaskFinder& textMaskFinder() noexcept;
 
 /// Returns the finder that works on every processor of the kind.
-[[nodiscard]] TextMaskFinder baseTextMaskFinder() noexcept;
+[[nodiscard]] const TextMaskFinder& baseTextMaskFinder() noexcept;
 
 /// Returns the finder for processors with wide vectors (AVX2), or null if there is none for this
 /// kind of processor.
-[[nodiscard]] TextMaskFinder wideTextMaskFinder() noexcept;
+[[nodiscard]] const TextMaskFinder* wideTextMaskFinder() noexcept;
 
 /// The same for processors with the widest vectors (AVX-512).
-[[nodiscard]] TextMaskFinder widestTextMaskFinder() noexcept;
+[[nodiscard]] const TextMaskFinder* widestTextMaskFinder() noexcept;
 
 }  // namespace umpre
 

@@ -22,8 +22,8 @@ struct Vector : BaseVector {
 
 }  // namespace
 
-TextMaskFinder baseTextMaskFinder() noexcept {
-    return TextMaskLoop<Vector>::find;
+const TextMaskFinder& baseTextMaskFinder() noexcept {
+    return TextMaskLoop<Vector>::kFinder;
 }
 
 }  // namespace umpre

@@ -34,6 +34,15 @@ struct WideVector : WideCounts<WideVector> {
         return _mm256_cmpeq_epi8(some, others);
     }
 
+    /// Compares signed numbers.
+    [[nodiscard]] static Bytes less(Bytes some, Bytes others) noexcept {
+        return _mm256_cmpgt_epi8(others, some);
+    }
+
+    [[nodiscard]] static Bytes difference(Bytes some, Bytes others) noexcept {
+        return _mm256_sub_epi8(some, others);
+    }
+
     [[nodiscard]] static Bytes either(Bytes some, Bytes others) noexcept {
         return _mm256_or_si256(some, others);
     }
@@ -45,11 +54,11 @@ struct WideVector : WideCounts<WideVector> {
 
 }  // namespace
 
-TextMaskFinder wideTextMaskFinder() noexcept {
-    return TextMaskLoop<WideVector>::find;
+const TextMaskFinder* wideTextMaskFinder() noexcept {
+    return &TextMaskLoop<WideVector>::kFinder;
 }
 #else
-TextMaskFinder wideTextMaskFinder() noexcept {
+const TextMaskFinder* wideTextMaskFinder() noexcept {
     return nullptr;
 }
 #endif

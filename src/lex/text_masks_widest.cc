@@ -30,6 +30,19 @@ struct WidestVector : WideCounts<WidestVector> {
         return _mm512_cmpeq_epi8_mask(some, others);
     }
 
+    /// Compares signed numbers.
+    [[nodiscard]] static Found less(Bytes some, Bytes others) noexcept {
+        return _mm512_cmplt_epi8_mask(some, others);
+    }
+
+    [[nodiscard]] static Bytes difference(Bytes some, Bytes others) noexcept {
+        return _mm512_sub_epi8(some, others);
+    }
+
+    [[nodiscard]] static Bytes either(Bytes some, Bytes others) noexcept {
+        return _mm512_or_si512(some, others);
+    }
+
     [[nodiscard]] static Found either(Found some, Found others) noexcept { return some | others; }
 
     [[nodiscard]] static TextMasks::Mask bits(Found found) noexcept { return found; }
@@ -37,11 +50,11 @@ struct WidestVector : WideCounts<WidestVector> {
 
 }  // namespace
 
-TextMaskFinder widestTextMaskFinder() noexcept {
-    return TextMaskLoop<WidestVector>::find;
+const TextMaskFinder* widestTextMaskFinder() noexcept {
+    return &TextMaskLoop<WidestVector>::kFinder;
 }
 #else
-TextMaskFinder widestTextMaskFinder() noexcept {
+const TextMaskFinder* widestTextMaskFinder() noexcept {
     return nullptr;
 }
 #endif

@@ -22,11 +22,7 @@ namespace umpre {
 
 // What is known of up to 64 bytes.
 struct TextScan::Block {
-    Block(const char* begin, const char* end) noexcept
-        : at(begin), bytes(ByteBlock::between(begin, end)) {}
-
     const char* at;
-    ByteBlock bytes;
     unsigned size = 0;
     Mask letters = 0;
     Mask words = 0;  // letters and digits
@@ -103,20 +99,21 @@ TextMark TextScan::scanBlock() {
 TextScan::Block TextScan::blockAt(const char* at) {
     const bool goesOn = openQuote_ != nullptr;
     const TextMap::Window window = map_.windowAt(at, end_, goesOn);
-    Block block(at, end_);
+    Block block{at};
     block.size = static_cast<unsigned>(
         std::min<std::size_t>(static_cast<std::size_t>(end_ - at), ByteBlock::kSize));
     const Mask all = bitsBelow(block.size);
     block.literals = block.strings = window.strings & all;
     block.lineFeeds = window.lineFeeds & all;
-    block.letters = block.bytes.letters();
-    block.words = block.letters | block.bytes.digits();
+    const WordMasks words = map_.finder().wordsIn(at);
+    block.letters = words.letters & all;
+    block.words = block.letters | (words.digits & all);
     block.size -= static_cast<unsigned>(std::countl_one(block.words & ~block.strings));
     const Mask inside = bitsBelow(block.size);
     block.letters &= inside;
     block.words &= inside;
     // What stands before these 64 bytes is not known here.
-    const Mask blanks = block.bytes.blanksAndUnusual() & ~block.lineFeeds;
+    const Mask blanks = words.blanksAndUnusual & ~block.lineFeeds;
     const Mask suspects = marksLineFeeds_ ? ~Mask{0} : blanks << 1U | 1U;
     const Mask escapedQuote = Mask{!goesOn} & Mask{*at == '"'} & Mask{at[-1] == '\\'};
     block.unusual = (((window.special | (block.lineFeeds & suspects)) & ~block.strings)
@@ -271,18 +268,15 @@ ByteBlock::Mask TextScan::namesIn(const Block& block) const noexcept {
 // if it may be a macro.
 ByteBlock::Mask TextScan::namesBehindNumbers(const Block& block, Mask numbers, Mask tails,
                                              Mask& found) const noexcept {
-    const ByteBlock lower = block.bytes.lower();
-    const Mask xs = lower.any('x');
-    const Mask us = lower.any('u');
-    const Mask ls = lower.any('l');
+    const NumberMasks of = map_.finder().numbersIn(block.at);
     const Mask digits = block.words & ~block.letters;
-    const Mask hexDigits = digits | (lower.firstLetters<6>() & block.letters);
-    const Mask firstHexDigits = (((numbers & block.bytes.any('0')) << 1U & xs) << 1U) & hexDigits;
+    const Mask hexDigits = digits | (of.hexLetters & block.letters);
+    const Mask firstHexDigits = (((numbers & of.zeros) << 1U & of.xs) << 1U) & hexDigits;
     const Mask behindHexDigits = (hexDigits + firstHexDigits) & ~hexDigits;
     const Mask behindDigits = (tails & ~(firstHexDigits >> 1U)) | behindHexDigits;
-    const Mask firstSuffixes = behindDigits & (us | ls);
+    const Mask firstSuffixes = behindDigits & (of.us | of.ls);
     const Mask secondSuffixes =
-        ((firstSuffixes & us) << 1U & ls) | ((firstSuffixes & ls) << 1U & us);
+        ((firstSuffixes & of.us) << 1U & of.ls) | ((firstSuffixes & of.ls) << 1U & of.us);
     const Mask behind = (behindDigits & ~firstSuffixes) | ((firstSuffixes << 1U) & ~secondSuffixes)
                         | secondSuffixes << 1U;
     for (Mask others = behind & block.words & ~block.letters; others != 0; others &= others - 1) {

@@ -11,6 +11,8 @@
 
 #include <gtest/gtest.h>
 
+#include "lex/spelling.h"
+
 namespace umpre {
 namespace {
 
@@ -65,12 +67,12 @@ constexpr std::size_t kBlock = 64;
     return bytes;
 }
 
-void expectMasks(TextMaskFinder finder, std::string_view bytes, std::size_t blocksTogether) {
+void expectMasks(const TextMaskFinder& finder, std::string_view bytes, std::size_t blocksTogether) {
     std::vector<TextMasks> found(bytes.size() / kBlock);
     BytesBefore before;
     for (std::size_t at = 0; at < found.size(); at += blocksTogether) {
-        finder(bytes.data() + at * kBlock, std::min(blocksTogether, found.size() - at), before,
-               found.data() + at);
+        finder.findText(bytes.data() + at * kBlock, std::min(blocksTogether, found.size() - at),
+                        before, found.data() + at);
     }
     const std::vector<TextMasks> expected = expectedMasks(bytes);
     for (std::size_t at = 0; at < found.size(); ++at) {
@@ -79,17 +81,17 @@ void expectMasks(TextMaskFinder finder, std::string_view bytes, std::size_t bloc
 }
 
 // The finders that work on this processor: those of the lesser ones, too.
-[[nodiscard]] std::vector<TextMaskFinder> finders() {
-    std::vector<TextMaskFinder> all{baseTextMaskFinder(), textMaskFinder()};
-    if (textMaskFinder() == widestTextMaskFinder()) {
+[[nodiscard]] std::vector<const TextMaskFinder*> finders() {
+    std::vector<const TextMaskFinder*> all{&baseTextMaskFinder(), &textMaskFinder()};
+    if (&textMaskFinder() == widestTextMaskFinder()) {
         all.push_back(wideTextMaskFinder());
     }
     return all;
 }
 
 void expectMasks(std::string_view bytes, std::size_t blocksTogether) {
-    for (const TextMaskFinder finder : finders()) {
-        expectMasks(finder, bytes, blocksTogether);
+    for (const TextMaskFinder* const finder : finders()) {
+        expectMasks(*finder, bytes, blocksTogether);
     }
 }
 
@@ -108,6 +110,43 @@ TEST(TextMasks, FollowBackslashesOverBlocks) {
             expectMasks(bytes, 2);
         }
     }
+}
+
+// All 256 bytes, 64 at a time.
+template <typename Masks, typename Test>
+void expectMask(Masks (*TextMaskFinder::*find)(const char*), TextMasks::Mask Masks::*mask,
+                Test test) {
+    for (unsigned first = 0; first < 256; first += kBlock) {
+        std::array<char, kBlock> bytes{};
+        TextMasks::Mask expected = 0;
+        for (unsigned place = 0; place < kBlock; ++place) {
+            bytes[place] = static_cast<char>(first + place);
+            expected |= static_cast<TextMasks::Mask>(test(bytes[place])) << place;
+        }
+        for (const TextMaskFinder* const finder : finders()) {
+            EXPECT_EQ((finder->*find)(bytes.data()).*mask, expected) << first;
+        }
+    }
+}
+
+TEST(TextMasks, KnowWords) {
+    expectMask(&TextMaskFinder::wordsIn, &WordMasks::letters, isNameStart);
+    expectMask(&TextMaskFinder::wordsIn, &WordMasks::digits, isDigit);
+    expectMask(&TextMaskFinder::wordsIn, &WordMasks::blanksAndUnusual, [](char byte) {
+        const auto code = static_cast<unsigned char>(byte);
+        return code <= ' ' || code > 127;
+    });
+}
+
+TEST(TextMasks, KnowWhatNumbersAreToldBy) {
+    const auto isOneOf = [](std::string_view bytes) {
+        return [bytes](char byte) { return bytes.find(byte) != std::string_view::npos; };
+    };
+    expectMask(&TextMaskFinder::numbersIn, &NumberMasks::zeros, isOneOf("0"));
+    expectMask(&TextMaskFinder::numbersIn, &NumberMasks::xs, isOneOf("xX"));
+    expectMask(&TextMaskFinder::numbersIn, &NumberMasks::us, isOneOf("uU"));
+    expectMask(&TextMaskFinder::numbersIn, &NumberMasks::ls, isOneOf("lL"));
+    expectMask(&TextMaskFinder::numbersIn, &NumberMasks::hexLetters, isOneOf("abcdefABCDEF"));
 }
 
 }  // namespace
