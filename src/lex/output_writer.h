@@ -7,9 +7,9 @@
 #include <optional>
 #include <string>
 #include <string_view>
-#include <vector>
 
 #include "lex/byte_sink.h"
+#include "lex/growing_array.h"
 #include "lex/snippet.h"
 #include "lex/source_position.h"
 
@@ -31,7 +31,7 @@ public:
             writeLarge(text);
             return;
         }
-        used_ += text.copy(block_.data() + used_, text.size());
+        used_ += text.copy(&block_[used_], text.size());
     }
 
     /// Writes a snippet as it is.
@@ -40,7 +40,7 @@ public:
             write(snippet.text());
             return;
         }
-        snippet.copyTo(block_.data() + used_);
+        snippet.copyTo(&block_[used_]);
         used_ += snippet.size();
     }
 
@@ -113,7 +113,7 @@ private:
     void writeLarge(std::string_view text);
     void handOver(std::string_view text);
 
-    std::vector<char> block_;
+    GrowingArray<char> block_;
     std::size_t used_ = 0;
     std::size_t blocks_ = 0;  // handed over
     std::optional<FileIdentity> target_;
