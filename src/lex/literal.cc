@@ -2,8 +2,6 @@
 #include "lex/literal.h"
 
 #include <algorithm>
-#include <cstddef>
-#include <optional>
 
 #include "lex/byte_block.h"
 #include "lex/spelling.h"
@@ -12,46 +10,30 @@ namespace umpre {
 
 using Result = LiteralScan::Result;
 
-namespace {
-
-// Tells what a quote, a line feed or a backslash in a literal ends; nothing if the literal goes on
-// behind the backslash and what follows it.
-[[nodiscard]] std::optional<LiteralScan> scanEndingAt(const char* stop, char quote,
-                                                      const char* end) noexcept {
-    if (*stop == quote) {
-        return LiteralScan{Result::Closed, stop + 1};
-    }
-    if (*stop == '\n') {
-        return LiteralScan{Result::Open, stop};
-    }
-    if (stop + 1 >= end) {
-        return LiteralScan{Result::Cut, stop};
-    }
-    if (isLineEndByte(stop[1])) {
-        return LiteralScan{Result::Open, stop};
-    }
-    return std::nullopt;
-}
-
-}  // namespace
-
 LiteralScan scanLiteral(const char* at, const char* end) noexcept {
+    using Block = BasicByteBlock<BaseVector, 32>;
     const char quote = *at++;
     if (quote == '\'' && at < end && *at == quote) {
         return {Result::Open, at};
     }
     while (at < end) {
         const char* const block = at;
-        ByteBlock::Mask stops = ByteBlock::between(block, end).any(quote, '\\', '\n');
-        at += ByteBlock::kSize;
+        Block::Mask stops = Block::between(block, end).any(quote, '\\', '\n');
+        at += Block::kSize;
         while (stops != 0) {
-            const char* const stop = block + firstBit(stops);
-            if (const std::optional<LiteralScan> scan = scanEndingAt(stop, quote, end)) {
-                return *scan;
+            const unsigned place = firstBit(stops);
+            const char* const stop = block + place;
+            if (*stop == quote) {
+                return {Result::Closed, stop + 1};
             }
-            const char* const behind = stop + 2;
-            at = std::max(at, behind);
-            stops &= ~bitsBelow(static_cast<std::size_t>(behind - block));
+            if (*stop == '\n' || (stop + 1 < end && isLineEndByte(stop[1]))) {
+                return {Result::Open, stop};
+            }
+            if (stop + 1 >= end) {
+                return {Result::Cut, stop};
+            }
+            stops &= ~(Block::Mask{3} << place);
+            at = std::max(at, stop + 2);
         }
     }
     return {Result::Cut, end};
