@@ -12,33 +12,49 @@ namespace {
 
 class Reader {
 public:
-    Reader(const char* end, const NameFilter& macroNames, CallOutline& outline)
-        : end_(end), macroNames_(macroNames), outline_(outline), makesOutline_(outline.begin()) {}
+    Reader(const char* begin, const char* end, const NameFilter& macroNames, CallOutline& outline)
+        : end_(end),
+          macroNames_(macroNames),
+          outline_(outline),
+          makesOutline_(outline.begin()),
+          places_(begin) {}
 
     /// Reads one argument, from its first byte to the "," or ")" that ends it. Returns null if it
     /// does not stand as it should.
-    [[nodiscard]] const char* read(const char* at, ArgumentText& argument) {
-        const char* const begin = at;
+    [[nodiscard]] const char* read(const char* begin, ArgumentText& argument) {
+        argument = {};
         std::size_t depth = 0;
-        while (at != nullptr && at < end_) {
-            if (!isDelimiter(*at)) {
-                at = places_.next(at, end_);
-            }
+        for (;;) {
+            const char* const at = places_.next(end_);
             if (at == end_) {
                 return nullptr;
             }
-            if (endsArgument(at, depth)) {
+            if (isNameStart(*at)) {
+                passName(at, argument);
+            } else if (endsArgument(at, depth)) {
                 argument.raw = withoutBlanksBehind(begin, at);
                 return at;
+            } else if (!passToken(at, depth, argument)) {
+                return nullptr;
             }
-            at = passToken(at, depth, argument);
         }
-        return nullptr;
+    }
+
+    /// Returns where the blanks before an argument end.
+    [[nodiscard]] const char* passBlanks(const char* at) noexcept {
+        if (isNoBlank(*at)) {
+            return at;
+        }
+        const bool isSpace = *at == ' ' && isNoBlank(at[1]);
+        const char* const behind = isSpace ? at + 1 : skipBlankBytes(at, end_);
+        places_.resume(behind);
+        return behind;
     }
 
 private:
-    [[nodiscard]] static bool isDelimiter(char byte) noexcept {
-        return byte == ',' || byte == '(' || byte == ')';
+    // Tells quickly of most bytes that they are no blanks.
+    [[nodiscard]] static bool isNoBlank(char byte) noexcept {
+        return static_cast<unsigned char>(byte) > ' ';
     }
 
     [[nodiscard]] static std::string_view viewOf(const char* begin, const char* end) noexcept {
@@ -47,40 +63,47 @@ private:
 
     [[nodiscard]] static std::string_view withoutBlanksBehind(const char* begin,
                                                               const char* end) noexcept {
-        while (end > begin && isBlankByte(end[-1])) {
+        while (end > begin && !isNoBlank(end[-1]) && isBlankByte(end[-1])) {
             --end;
         }
         return viewOf(begin, end);
     }
 
-    [[nodiscard]] const char* passToken(const char* at, std::size_t& depth,
-                                        ArgumentText& argument) {
-        const char byte = *at;
-        if (isNameStart(byte)) {
-            return passName(at, argument);
-        }
-        if (isDelimiter(byte)) {
-            return passDelimiter(at, depth, argument);
-        }
-        if (isDigit(byte)) {
-            return places_.numberEndAt(at);
-        }
-        return isBlankByte(byte) ? passBlanks(at, depth) : unusualTokenEnd(at, end_);
-    }
-
-    [[nodiscard]] const char* passName(const char* at, ArgumentText& argument) const {
-        const char* const behind = places_.nameEndAt(at);
+    void passName(const char* at, ArgumentText& argument) {
+        const char* const behind = places_.passName(at);
         argument.mayHaveMacros =
             argument.mayHaveMacros || macroNames_.mayHoldAmongBytes(viewOf(at, behind));
-        return behind;
     }
 
-    [[nodiscard]] const char* passDelimiter(const char* at, std::size_t& depth,
-                                            ArgumentText& argument) {
+    // Returns false if what begins there does not stand as it should.
+    [[nodiscard]] bool passToken(const char* at, std::size_t& depth, ArgumentText& argument) {
+        const char byte = *at;
+        if (byte == ',' || byte == '(' || byte == ')') {
+            passDelimiter(at, depth, argument);
+            return true;
+        }
+        if (isDigit(byte)) {
+            (void)places_.passNumber(at);
+            return true;
+        }
+        if (isBlankByte(byte)) {
+            return passBlanksWithin(at, depth);
+        }
+        argument.mayHaveQuotes = true;
+        const char* const behind = unusualTokenEnd(at, end_);
+        if (behind != nullptr) {
+            places_.resume(behind);
+        }
+        return behind != nullptr;
+    }
+
+    void passDelimiter(const char* at, std::size_t& depth, ArgumentText& argument) {
         const char* const close = *at == '(' && !makesOutline_ ? outline_.closing(at) : nullptr;
         if (close != nullptr) {
             argument.mayHaveMacros = true;
-            return close + 1;
+            argument.mayHaveQuotes = true;
+            places_.resume(close + 1);
+            return;
         }
         if (*at == '(') {
             ++depth;
@@ -90,18 +113,18 @@ private:
         if (makesOutline_) {
             outline_.note(at);
         }
-        return at + 1;
     }
 
-    // Returns where blanks end, or null if they are neither one space nor at the argument's end.
-    [[nodiscard]] const char* passBlanks(const char* at, std::size_t depth) const {
+    // Returns false if blanks are neither one space nor at the argument's end.
+    [[nodiscard]] bool passBlanksWithin(const char* at, std::size_t depth) {
         const char* const behind = skipBlankBytes(at, end_);
+        places_.resume(behind);
         const bool isSpace = *at == ' ' && behind == at + 1;
-        return isSpace || (behind < end_ && endsArgument(behind, depth)) ? behind : nullptr;
+        return isSpace || (behind < end_ && endsArgument(behind, depth));
     }
 
     [[nodiscard]] static bool endsArgument(const char* at, std::size_t depth) noexcept {
-        return depth == 0 && (*at == ',' || *at == ')');
+        return (*at == ',' || *at == ')') && depth == 0;
     }
 
     const char* end_;
@@ -131,23 +154,20 @@ const char* CallOutline::closing(const char* open) const {
     return it != parentheses_.end() && it->open == open ? it->close : nullptr;
 }
 
-const char* takeArgumentTexts(const char* open, const char* end, std::size_t count,
-                              const NameFilter& macroNames, CallOutline& outline,
-                              std::vector<ArgumentText>& arguments) {
-    Reader reader(end, macroNames, outline);
-    const char* at = skipBlankBytes(open + 1, end);
-    std::size_t taken = 0;
-    while (at < end && *at != ')' && taken < count) {
-        at = reader.read(at, arguments.emplace_back());
-        ++taken;
+const char* takeArgumentTexts(const char* open, const char* end, const NameFilter& macroNames,
+                              CallOutline& outline, std::span<ArgumentText> arguments) {
+    Reader reader(open + 1, end, macroNames, outline);
+    const char* at = reader.passBlanks(open + 1);
+    for (ArgumentText& argument : arguments) {
+        at = at < end && *at != ')' ? reader.read(at, argument) : nullptr;
         if (at == nullptr) {
             return nullptr;
         }
         if (*at == ',') {
-            at = skipBlankBytes(at + 1, end);
+            at = reader.passBlanks(at + 1);
         }
     }
-    return at < end && *at == ')' && taken == count ? at + 1 : nullptr;
+    return at < end && *at == ')' ? at + 1 : nullptr;
 }
 
 }  // namespace umpre

@@ -3,7 +3,7 @@
 #define UMPRE_MACROS_ARGUMENT_TEXTS_H
 
 #include <cstddef>
-#include <optional>
+#include <span>
 #include <string_view>
 #include <utility>
 #include <vector>
@@ -16,10 +16,11 @@ namespace umpre {
 struct ArgumentText {
     /// As written, with one space between two tokens and none at the ends.
     std::string_view raw;
+    /// All that it comes out as; without bytes until it is worked out.
+    std::string_view expansion;
     bool mayHaveMacros = false;  ///< in `raw`
-    /// All that it comes out as, once it is worked out.
-    std::optional<std::string_view> expansion;
-    bool hasMacros = false;  ///< names of macros were left in the expansion
+    bool mayHaveQuotes = false;  ///< or backslashes, in `raw`
+    bool hasMacros = false;      ///< names of macros were left in the expansion
 };
 
 /// Where the parentheses in the arguments of a call close, so that a call in them is passed over
@@ -52,15 +53,15 @@ private:
     bool isBegun_ = false;
 };
 
-/// Adds the arguments of a call as views of its bytes, behind which eight more can be read. Returns
+/// Takes the arguments of a call as views of its bytes, from each of which 32 can be read. Returns
 /// the end of the call whose "(" is at `open`, or null if that is not told by the bytes before
-/// `end`: the call goes on behind them or over a line end, its arguments are not `count`, or one of
+/// `end`: the call goes on behind them or over a line end, it has not so many arguments, or one of
 /// them does not stand as it should.
 /// The first call makes the `outline`, for those in its arguments; it must be cleared before their
 /// bytes are other ones.
-[[nodiscard]] const char* takeArgumentTexts(const char* open, const char* end, std::size_t count,
+[[nodiscard]] const char* takeArgumentTexts(const char* open, const char* end,
                                             const NameFilter& macroNames, CallOutline& outline,
-                                            std::vector<ArgumentText>& arguments);
+                                            std::span<ArgumentText> arguments);
 
 }  // namespace umpre
 

@@ -37,7 +37,7 @@ struct MacroText {
 /// worked out at its first use.
 class Macro {
 public:
-    /// A zero byte follows it, and from each of its bytes eight can be read.
+    /// A zero byte follows it, and from each of its bytes 32 can be read.
     [[nodiscard]] std::string_view text() const noexcept {
         return {bytes_ + parametersSize_, textSize_};
     }

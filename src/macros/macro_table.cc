@@ -17,8 +17,8 @@ namespace {
 
 constexpr std::size_t kFirstSlots = 256;
 
-// Readers of names look at eight bytes at a time, so that many can be read behind the last.
-constexpr std::size_t kReadable = 8;
+// Readers look at up to 32 bytes at a time, so that many can be read behind the last.
+constexpr std::size_t kReadable = 32;
 
 constexpr std::size_t kCacheLine = 64;
 

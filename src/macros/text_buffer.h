@@ -2,8 +2,9 @@
 #ifndef UMPRE_MACROS_TEXT_BUFFER_H
 #define UMPRE_MACROS_TEXT_BUFFER_H
 
+#include <algorithm>
+#include <array>
 #include <cstddef>
-#include <cstdint>
 #include <cstring>
 #include <string_view>
 #include <vector>
@@ -21,37 +22,42 @@ public:
         std::size_t end;
     };
 
+    TextBuffer() { grow(0); }
+
     void clear() noexcept {
-        bytes_.clear();
+        end_ = begin_;
         settled_.clear();
     }
 
-    [[nodiscard]] std::size_t size() const noexcept { return bytes_.size(); }
+    [[nodiscard]] std::size_t size() const noexcept {
+        return static_cast<std::size_t>(end_ - begin_);
+    }
 
-    [[nodiscard]] bool empty() const noexcept { return bytes_.size() == 0; }
+    [[nodiscard]] char operator[](std::size_t place) const noexcept { return begin_[place]; }
 
-    /// Returns the last byte of a text that is not empty.
-    [[nodiscard]] char back() const noexcept { return bytes_[bytes_.size() - 1]; }
-
-    void append(std::string_view text) {
-        char* const to = bytes_.extend(text.size());
-        const char* const from = text.data();
+    /// Adds a text from whose first byte 16 can be read.
+    [[gnu::always_inline]] void append(std::string_view text) {
         const std::size_t size = text.size();
-        if (size > 2 * sizeof(Word)) {
-            std::memcpy(to, from, size);
-        } else if (size >= sizeof(Word)) {
-            copyEnds<Word>(to, from, size);
-        } else if (size >= sizeof(HalfWord)) {
-            copyEnds<HalfWord>(to, from, size);
+        char* const to = extend(size);
+        if (size <= sizeof(Unit)) {
+            std::memcpy(to, text.data(), sizeof(Unit));
+        } else if (size <= 2 * sizeof(Unit)) {
+            Unit last;
+            std::memcpy(&last, text.data() + size - sizeof(Unit), sizeof(Unit));
+            std::memcpy(to, text.data(), sizeof(Unit));
+            std::memcpy(to + size - sizeof(Unit), &last, sizeof(Unit));
         } else {
-            for (std::size_t index = 0; index < size; ++index) {
-                to[index] = from[index];
-            }
+            std::memcpy(to, text.data(), size);
         }
     }
 
+    void append(char byte) { *extend(1) = byte; }
+
+    /// Adds a text of which no more can be read.
+    void appendAlone(std::string_view text) { text.copy(extend(text.size()), text.size()); }
+
     /// Takes away what was added behind the first `size` bytes, of which nothing is settled.
-    void truncate(std::size_t size) noexcept { bytes_.truncate(size); }
+    void truncate(std::size_t size) noexcept { end_ = begin_ + size; }
 
     /// Notes that the bytes from `begin` on are settled.
     void settleFrom(std::size_t begin) {
@@ -68,36 +74,46 @@ public:
     [[nodiscard]] const std::vector<Part>& settled() const noexcept { return settled_; }
 
     [[nodiscard]] bool isSettled() const noexcept {
-        return empty()
+        return size() == 0
                || (!settled_.empty() && settled_.front().begin == 0
                    && settled_.front().end == size());
     }
 
-    /// Returns the text. A zero byte follows it.
+    /// Returns the text. A zero byte follows it, and from each of its bytes 32 can be read.
     [[nodiscard]] std::string_view view() noexcept {
-        if (empty()) {
-            return "";
-        }
-        bytes_[size()] = '\0';
-        return {bytes_.data(), size()};
+        *end_ = '\0';
+        return {begin_, size()};
     }
 
 private:
-    using Word = std::uint64_t;
-    using HalfWord = std::uint32_t;
+    using Unit = std::array<char, 16>;
 
-    // Copies as one unit from each end; they may overlap.
-    template <typename Unit>
-    static void copyEnds(char* to, const char* from, std::size_t size) noexcept {
-        Unit first = 0;
-        Unit last = 0;
-        std::memcpy(&first, from, sizeof(Unit));
-        std::memcpy(&last, from + size - sizeof(Unit), sizeof(Unit));
-        std::memcpy(to, &first, sizeof(Unit));
-        std::memcpy(to + size - sizeof(Unit), &last, sizeof(Unit));
+    static constexpr std::size_t kBehind = 32;
+
+    // Adds so many bytes and returns where they are to be written.
+    [[nodiscard]] char* extend(std::size_t count) {
+        if (count > static_cast<std::size_t>(limit_ - end_)) {
+            grow(count);
+        }
+        char* const added = end_;
+        end_ += count;
+        return added;
     }
 
-    GrowingArray<char> bytes_;
+    // Makes room for at least so many bytes.
+    [[gnu::noinline]] void grow(std::size_t count) {
+        const std::size_t used = size();
+        memory_.truncate(used);
+        (void)memory_.extend(std::max(count, used) + kBehind);
+        begin_ = &memory_[0];
+        end_ = begin_ + used;
+        limit_ = begin_ + memory_.size() - kBehind;
+    }
+
+    GrowingArray<char> memory_;
+    char* begin_ = nullptr;
+    char* end_ = nullptr;
+    char* limit_ = nullptr;      // behind it is some room more
     std::vector<Part> settled_;  // in order
 };
 

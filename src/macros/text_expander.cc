@@ -28,7 +28,6 @@
 #include "lex/token_join.h"
 #include "macros/argument_texts.h"
 #include "macros/predefined_macros.h"
-#include "macros/stringize.h"
 
 namespace umpre {
 namespace {
@@ -85,12 +84,12 @@ bool TextExpander::read(std::string_view text, const std::vector<TextBuffer::Par
         return false;
     }
     const char* const end = text.data() + text.size();
-    Reading reading{text.data(), end, text.data(), place};
+    Reading reading{end, text.data(), place, TextPlaces<PlacesFor::Tokens>(text.data())};
     for (const TextBuffer::Part& part : settled) {
         if (!readUpTo(text.data() + part.begin, reading, result)) {
             return false;
         }
-        reading.at = std::max(reading.at, text.data() + part.end);
+        reading.places.resume(text.data() + part.end);
     }
     if (!readUpTo(end, reading, result)) {
         return false;
@@ -100,40 +99,46 @@ bool TextExpander::read(std::string_view text, const std::vector<TextBuffer::Par
 }
 
 bool TextExpander::readUpTo(const char* end, Reading& reading, Result& result) {
-    while (reading.at != nullptr && reading.at < end) {
-        reading.at = reading.places.next(reading.at, end);
-        if (reading.at == end) {
+    for (;;) {
+        const char* const at = reading.places.next(end);
+        if (at == end) {
             return true;
         }
-        if (isNameStart(*reading.at)) {
-            if (!readName(reading, result)) {
+        if (isNameStart(*at)) {
+            if (!readName(at, reading, result)) {
                 return false;
             }
-        } else if (isDigit(*reading.at)) {
-            reading.at = reading.places.numberEndAt(reading.at);
+        } else if (isDigit(*at)) {
+            (void)reading.places.passNumber(at);
         } else {
-            reading.at = unusualTokenEnd(reading.at, end);
+            const char* const behind = unusualTokenEnd(at, end);
+            if (behind == nullptr) {
+                return false;
+            }
+            reading.places.resume(behind);
         }
     }
-    return reading.at != nullptr;
 }
 
-bool TextExpander::readName(Reading& reading, Result& result) {
-    const char* const behind = reading.places.nameEndAt(reading.at);
-    const MacroName* const name = macroOf(viewOf(reading.at, behind));
+bool TextExpander::readName(const char* at, Reading& reading, Result& result) {
+    const char* const behind = reading.places.passName(at);
+    const MacroName* const name = macroOf(viewOf(at, behind));
     if (name == nullptr) {
-        reading.at = behind;
-    } else if (stays(*name, behind, reading.end, reading.place)) {
-        result.hasMacros = true;
-        reading.at = behind;
-    } else {
-        if (!add(viewOf(reading.run, reading.at), result)) {
-            return false;
-        }
-        reading.at = replace(*name, behind, reading.end, reading.place, result);
-        reading.run = reading.at;
+        return true;
     }
-    return reading.at != nullptr;
+    if (stays(*name, behind, reading.end, reading.place)) {
+        result.hasMacros = true;
+        return true;
+    }
+    if (!add(viewOf(reading.run, at), result)) {
+        return false;
+    }
+    reading.run = replace(*name, behind, reading.end, reading.place, result);
+    if (reading.run == nullptr) {
+        return false;
+    }
+    reading.places.resume(reading.run);
+    return true;
 }
 
 // Returns where replacements in a text at this place stand.
@@ -176,8 +181,9 @@ const char* TextExpander::replaceCall(const MacroName& name, const char* open, c
                                       Place place, Result& result) {
     const std::size_t argumentsBefore = arguments_.size();
     const std::size_t buffersBefore = buffersUsed_;
-    const char* const behind = takeArgumentTexts(open, end, name.macro.parameterCount(),
-                                                 macros_.filter(), outline_, arguments_);
+    const std::size_t count = name.macro.parameterCount();
+    const char* const behind =
+        takeArgumentTexts(open, end, macros_.filter(), outline_, {arguments_.extend(count), count});
     if (behind == nullptr) {
         return nullptr;
     }
@@ -186,7 +192,7 @@ const char* TextExpander::replaceCall(const MacroName& name, const char* open, c
     if (!body.isPlain || !addReplacement(name, body, argumentsBefore, place, result)) {
         return nullptr;
     }
-    arguments_.resize(argumentsBefore);
+    arguments_.truncate(argumentsBefore);
     buffersUsed_ = buffersBefore;
     return behind;
 }
@@ -217,9 +223,13 @@ bool TextExpander::addReplacement(const MacroName& name, const MacroBody& body,
 
 bool TextExpander::substitute(const MacroBody& body, std::size_t firstArgument, Result& result) {
     for (const BodyStep& step : body.steps) {
-        const Part part = partOf(body, step, firstArgument);
-        if (part.text.data() == nullptr || !addPart(part.text, !part.hasMacros, result)) {
+        const std::size_t before = result.text.size();
+        result.hasMacros = hasMacros(body, step);
+        if (!addStep(body, step, firstArgument, result)) {
             return false;
+        }
+        if (!result.hasMacros) {
+            result.text.settleFrom(before);
         }
     }
     return true;
@@ -228,65 +238,68 @@ bool TextExpander::substitute(const MacroBody& body, std::size_t firstArgument, 
 // Adds a replacement to what it becomes part of, without reading it again. Returns false if names
 // of macros are left in it, or if it is not told.
 bool TextExpander::addSettled(const MacroBody& body, std::size_t firstArgument, Result& result) {
+    Result replacement{result.text, result.isWritten};
     for (const BodyStep& step : body.steps) {
-        Part part{step.text};
-        if (step.kind == BodyStep::Kind::Argument) {
-            ArgumentText& argument = arguments_[firstArgument + step.first];
-            part = argument.mayHaveMacros ? argumentPart(argument) : Part{argument.raw};
-        } else if (step.kind != BodyStep::Kind::Tokens) {
-            part = partOf(body, step, firstArgument);
-        }
-        if (part.text.data() == nullptr || part.hasMacros || isTooMuch(part.text.size())
-            || !add(part.text, result)) {
+        const std::string_view* const text = textOf(step, firstArgument);
+        const bool isAdded = text != nullptr ? addCounted(*text, replacement)
+                                             : addStep(body, step, firstArgument, replacement);
+        if (!isAdded || replacement.hasMacros) {
             return false;
         }
     }
     return true;
 }
 
-TextExpander::Part TextExpander::partOf(const MacroBody& body, const BodyStep& step,
-                                        std::size_t firstArgument) {
+// Adds what a step yields, and notes whether names of macros are left in an argument of it, or in
+// what was joined.
+bool TextExpander::addStep(const MacroBody& body, const BodyStep& step, std::size_t firstArgument,
+                           Result& result) {
     switch (step.kind) {
-    case BodyStep::Kind::Tokens: return {step.text, hasMacros(body, step)};
-    case BodyStep::Kind::Argument: return argumentPart(arguments_[firstArgument + step.first]);
-    case BodyStep::Kind::Joined: return joinedPart(body, step, firstArgument);
-    default: return {};
+    case BodyStep::Kind::Tokens: return addCounted(step.text, result);
+    case BodyStep::Kind::Argument: return addArgument(firstArgument + step.first, result);
+    case BodyStep::Kind::Joined: return addJoined(body, step, firstArgument, result);
+    default: return false;
     }
 }
 
-TextExpander::Part TextExpander::argumentPart(ArgumentText& argument) {
-    if (!argument.mayHaveMacros && !watches_) {
-        return {argument.raw};
+// Returns the text that a step yields, if it does so wherever no names are watched; otherwise null.
+inline const std::string_view* TextExpander::textOf(const BodyStep& step,
+                                                    std::size_t firstArgument) {
+    if (step.kind == BodyStep::Kind::Argument) {
+        const ArgumentText& argument = arguments_[firstArgument + step.first];
+        return argument.mayHaveMacros ? nullptr : &argument.raw;
     }
-    const auto index = static_cast<std::size_t>(&argument - arguments_.data());
-    if (!argument.expansion) {
+    return step.kind == BodyStep::Kind::Tokens ? &step.text : nullptr;
+}
+
+// Adds what an argument comes out as.
+bool TextExpander::addArgument(std::size_t argument, Result& result) {
+    if (!arguments_[argument].mayHaveMacros && !watches_) {
+        return addCounted(arguments_[argument].raw, result);
+    }
+    if (arguments_[argument].expansion.data() == nullptr) {
         Result expansion{takeBuffer()};
-        if (!read(argument.raw, kNoParts, Place::Argument, expansion)) {
-            return {};
+        if (!read(arguments_[argument].raw, kNoParts, Place::Argument, expansion)) {
+            return false;
         }
-        arguments_[index].expansion = expansion.text.view();
-        arguments_[index].hasMacros = expansion.hasMacros;
+        arguments_[argument].expansion = expansion.text.view();
+        arguments_[argument].hasMacros = expansion.hasMacros;
     }
-    return {*arguments_[index].expansion, arguments_[index].hasMacros};
+    result.hasMacros = result.hasMacros || arguments_[argument].hasMacros;
+    return addCounted(arguments_[argument].expansion, result);
 }
 
-TextExpander::Part TextExpander::joinedPart(const MacroBody& body, const BodyStep& step,
-                                            std::size_t firstArgument) {
-    TextBuffer& joined = takeBuffer();
-    for (std::size_t index = step.first; index < step.last; ++index) {
-        const BodyOperand operand = body.operands[index];
-        if (operand.kind == BodyOperand::Kind::Token) {
-            joined.append(body.tokens->text(operand.index));
-        } else if (operand.kind == BodyOperand::Kind::RawArgument) {
-            joined.append(arguments_[firstArgument + operand.index].raw);
-        } else {
-            literal_.clear();
-            stringize(arguments_[firstArgument + operand.index].raw, literal_);
-            joined.append(literal_);
-        }
+bool TextExpander::addJoined(const MacroBody& body, const BodyStep& step, std::size_t firstArgument,
+                             Result& result) {
+    const std::size_t before = result.text.size();
+    const bool isLiteral = join_.isLiteral(body, step, &arguments_[firstArgument]);
+    const bool isAdded =
+        join_.join(body, step, &arguments_[firstArgument], kMostWork - work_, result.text);
+    const std::string_view text = result.text.view().substr(before);
+    if (!isAdded || isTooMuch(text.size()) || meets(before, result)) {
+        return false;
     }
-    Part part{joined.view()};
-    return isPlain(part.text, part.hasMacros) ? part : Part{};
+    return isLiteral || isPlain(text, result.hasMacros);
 }
 
 // Tells whether a joined text yields tokens of text only, and notes whether there are names of
@@ -296,7 +309,7 @@ bool TextExpander::isPlain(std::string_view text, bool& hasMacros) {
     const char* at = text.data();
     while (at != nullptr && at < end) {
         if (isNameStart(*at)) {
-            const char* const behind = nameEnd(at);
+            const char* const behind = nameEndAhead(at);
             hasMacros = hasMacros || macroOf(viewOf(at, behind)) != nullptr;
             at = behind;
         } else {
@@ -306,28 +319,23 @@ bool TextExpander::isPlain(std::string_view text, bool& hasMacros) {
     return at != nullptr;
 }
 
-// Adds a text, unless the bytes that meet there may belong to one token.
-inline bool TextExpander::add(std::string_view text, Result& result) {
-    if (text.empty()) {
-        return true;
-    }
-    if (!result.isWritten && !result.text.empty() && mayMeet(result.text.back(), text.front())) {
-        return false;
-    }
-    result.text.append(text);
-    return true;
+// Tells whether the bytes that meet where something was added may belong to one token.
+inline bool TextExpander::meets(std::size_t before, const Result& result) {
+    const TextBuffer& text = result.text;
+    return !result.isWritten && before > 0 && before < text.size()
+           && mayMeet(text[before - 1], text[before]);
 }
 
-// The same for a part of a replacement, which may be settled.
-bool TextExpander::addPart(std::string_view text, bool isSettled, Result& result) {
-    const std::size_t begin = result.text.size();
-    if (isTooMuch(text.size()) || !add(text, result)) {
-        return false;
-    }
-    if (isSettled) {
-        result.text.settleFrom(begin);
-    }
-    return true;
+// Adds a text, unless the bytes that meet there may belong to one token.
+[[gnu::always_inline]] inline bool TextExpander::add(std::string_view text, Result& result) {
+    const std::size_t before = result.text.size();
+    result.text.append(text);
+    return !meets(before, result);
+}
+
+// The same for a part of a replacement.
+inline bool TextExpander::addCounted(std::string_view text, Result& result) {
+    return !isTooMuch(text.size()) && add(text, result);
 }
 
 // Counts bytes that are written, and tells whether they were too many.
@@ -359,7 +367,7 @@ bool TextExpander::hasMacros(const MacroBody& body, const BodyStep& step) {
     return any;
 }
 
-// Returns the macro of this name, or null. From the bytes of all texts here eight can be read.
+// Returns the macro of this name, or null.
 inline const MacroName* TextExpander::macroOf(std::string_view name) {
     if (watches_) {
         macros_.watch(name);
@@ -368,8 +376,13 @@ inline const MacroName* TextExpander::macroOf(std::string_view name) {
                                                                          : nullptr;
 }
 
-bool TextExpander::isAround(const MacroName& name) const {
-    return std::find(around_.begin(), around_.end(), &name) != around_.end();
+inline bool TextExpander::isAround(const MacroName& name) const {
+    for (const MacroName* const one : around_) {
+        if (one == &name) {
+            return true;
+        }
+    }
+    return false;
 }
 
 // Returns an empty text for use until the call that is replaced has been.

@@ -4,13 +4,14 @@
 
 #include <cstddef>
 #include <memory>
-#include <string>
 #include <string_view>
 #include <vector>
 
+#include "lex/growing_array.h"
 #include "macros/argument_texts.h"
 #include "macros/macro_body.h"
 #include "macros/macro_table.h"
+#include "macros/operand_join.h"
 #include "macros/text_buffer.h"
 #include "macros/text_places.h"
 
@@ -50,19 +51,12 @@ private:
         bool hasMacros = false;  // names of macros were left in it
     };
 
-    // What a step adds to a replacement; without bytes if that is not told.
-    struct Part {
-        std::string_view text;
-        bool hasMacros = false;
-    };
-
     // A text that is read.
     struct Reading {
-        const char* at = nullptr;
-        const char* end = nullptr;
-        const char* run = nullptr;  // what is not added yet begins here
-        Place place = Place::Replacement;
-        TextPlaces<PlacesFor::Tokens> places{};
+        const char* end;
+        const char* run;  // what is not added yet begins here
+        Place place;
+        TextPlaces<PlacesFor::Tokens> places;
     };
 
     [[nodiscard]] const char* expand(const MacroName& name, const char* behind, const char* end,
@@ -70,7 +64,7 @@ private:
     [[nodiscard]] bool read(std::string_view text, const std::vector<TextBuffer::Part>& settled,
                             Place place, Result& result);
     [[nodiscard]] bool readUpTo(const char* end, Reading& reading, Result& result);
-    [[nodiscard]] bool readName(Reading& reading, Result& result);
+    [[nodiscard]] bool readName(const char* at, Reading& reading, Result& result);
     [[nodiscard]] bool stays(const MacroName& name, const char* behind, const char* end,
                              Place place) const;
     [[nodiscard]] const char* replace(const MacroName& name, const char* behind, const char* end,
@@ -82,15 +76,17 @@ private:
                                       std::size_t firstArgument, Place place, Result& result);
     [[nodiscard]] bool substitute(const MacroBody& body, std::size_t firstArgument, Result& result);
     [[nodiscard]] bool addSettled(const MacroBody& body, std::size_t firstArgument, Result& result);
-    [[nodiscard]] Part partOf(const MacroBody& body, const BodyStep& step,
-                              std::size_t firstArgument);
-    [[nodiscard]] Part argumentPart(ArgumentText& argument);
-    [[nodiscard]] Part joinedPart(const MacroBody& body, const BodyStep& step,
-                                  std::size_t firstArgument);
+    [[nodiscard]] bool addStep(const MacroBody& body, const BodyStep& step,
+                               std::size_t firstArgument, Result& result);
+    [[nodiscard]] const std::string_view* textOf(const BodyStep& step, std::size_t firstArgument);
+    [[nodiscard]] bool addArgument(std::size_t argument, Result& result);
+    [[nodiscard]] bool addJoined(const MacroBody& body, const BodyStep& step,
+                                 std::size_t firstArgument, Result& result);
     [[nodiscard]] bool isPlain(std::string_view text, bool& hasMacros);
     [[nodiscard]] bool isTooMuch(std::size_t bytes);
+    [[nodiscard]] static bool meets(std::size_t before, const Result& result);
     [[nodiscard]] static bool add(std::string_view text, Result& result);
-    [[nodiscard]] bool addPart(std::string_view text, bool isSettled, Result& result);
+    [[nodiscard]] bool addCounted(std::string_view text, Result& result);
     [[nodiscard]] bool hasMacros(const MacroBody& body, const BodyStep& step);
     [[nodiscard]] bool hasMacros(const MacroBody& body) const;
     [[nodiscard]] const MacroName* macroOf(std::string_view name);
@@ -103,11 +99,11 @@ private:
     std::size_t depth_ = 0;                 // of texts that are read
     std::size_t work_ = 0;                  // bytes read and written for one name of the text
     std::vector<const MacroName*> around_;  // whose replacements are read, the innermost one last
-    std::vector<ArgumentText> arguments_;   // of the calls that are replaced
+    GrowingArray<ArgumentText> arguments_;  // of the calls that are replaced
     CallOutline outline_;                   // of the arguments of the call in the text
     std::vector<std::unique_ptr<TextBuffer>> buffers_;  // the first of them in use
     std::size_t buffersUsed_ = 0;
-    std::string literal_;
+    OperandJoin join_;
 };
 
 }  // namespace umpre

@@ -10,24 +10,24 @@
 namespace umpre {
 namespace {
 
-// Returns the arguments found, each in brackets, with "!" where one may have macros, and the rest
-// of the text.
+// Returns the arguments found, each in brackets, with "!" where one may have macros and "?" where
+// it may have quotes, and the rest of the text.
 [[nodiscard]] std::string argumentsOf(std::string_view text, std::size_t count) {
     NameFilter names;
     names.add("N");
     CallOutline outline;
-    std::vector<ArgumentText> arguments;
+    std::vector<ArgumentText> arguments(count);
     // What is behind the end is not to be taken for the end of an argument.
-    const std::string padded = std::string(text) + ")       ";
+    const std::string padded = std::string(text) + ")" + std::string(32, ' ');
     const char* const end = padded.data() + text.size();
-    const char* const behind =
-        takeArgumentTexts(padded.data(), end, count, names, outline, arguments);
+    const char* const behind = takeArgumentTexts(padded.data(), end, names, outline, arguments);
     if (behind == nullptr) {
         return "(not told)";
     }
     std::string result;
     for (const ArgumentText& argument : arguments) {
-        result.append("[").append(argument.raw).append(argument.mayHaveMacros ? "]!" : "]");
+        result.append("[").append(argument.raw).append("]");
+        result.append(argument.mayHaveMacros ? "!" : "").append(argument.mayHaveQuotes ? "?" : "");
     }
     return result.append(behind, end);
 }
@@ -49,10 +49,12 @@ TEST(ArgumentTexts, AreFound) {
         {"(a\t,\t b  )", 2, "[a][b]"},
         {"((a, b), (c))", 2, "[(a, b)][(c)]"},
         {"([a,b])", 2, "[[a][b]]"},
-        {"(\"a,b)\", '(')", 2, "[\"a,b)\"]['(']"},
+        {"(\"a,b)\", '(')", 2, "[\"a,b)\"]?['(']?"},
         {"(N, a N1, x + N)", 3, "[N]![a N1][x + N]!"},
         {"(1N, 0x1N)", 2, "[1N]![0x1N]!"},
-        {"(a / b, \\)", 2, "[a / b][\\]"},
+        {"(1 08 123, 1uN)", 2, "[1 08 123][1uN]!"},
+        {"(1 0xN 2, a1N)", 2, "[1 0xN 2][a1N]"},
+        {"(a / b, \\)", 2, "[a / b]?[\\]?"},
         {"(a, b,)x,", 2, "[a][b]x,"},
     };
     for (const Row& row : rows) {
@@ -75,7 +77,7 @@ TEST(ArgumentTexts, AreFoundBehindAnyNumberOfBytes) {
     for (std::size_t count = 1; count < 140; ++count) {
         const std::string before(count, 'a');
         EXPECT_EQ(argumentsOf("(" + before + " \"N)\" N0 08N 0x1N , \t12 )", 2),
-                  "[" + before + " \"N)\" N0 08N 0x1N]![12]");
+                  "[" + before + " \"N)\" N0 08N 0x1N]!?[12]");
         EXPECT_EQ(argumentsOf("(" + before + "  N)", 1), "(not told)");
     }
 }

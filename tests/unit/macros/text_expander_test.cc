@@ -28,7 +28,7 @@ struct Fixture {
     // Expands what a text begins with: a name, or a name and its arguments. Puts "|" before the
     // rest.
     [[nodiscard]] std::string expanded(std::string_view text) {
-        const std::string all = std::string(text) + "        ";
+        const std::string all = std::string(text) + std::string(32, ' ');
         const std::string name(text.substr(0, text.find('(')));
         const char* const end = all.data() + text.size();
         TextBuffer result;
@@ -136,6 +136,9 @@ TEST(TextExpander, ExpandsCalls) {
         {"JOIN(a,b)", "ab"},
         {"JOIN(N,1)", "N1"},
         {"JOIN(,N)", "3"},
+        {"JOIN(1,N)", "13"},  // two tokens
+        {"JOIN(a N,N)", "a NN"},
+        {"JOIN(\"N\",N)", "\"N\"3"},
         {"JOIN(F,)", kNotTold},  // a last argument is never empty
         {"CALL(F,1)", "[1]"},
         {"CALL(N,1)", "3(1)"},
@@ -236,7 +239,7 @@ TEST(TextExpander, TellsNothingWhereEachMacroIsToldOf) {
     f.define("F", "x", "x");
     BodyMaker bodies(f.lexer, f.macros, true);
     TextExpander expander(f.macros, bodies);
-    const std::string call = "(1)        ";
+    const std::string call = "(1)" + std::string(32, ' ');
     TextBuffer result;
     EXPECT_FALSE(expander.expandObject(*f.macros.find("N"), result));
     EXPECT_EQ(expander.expandCall(*f.macros.find("F"), call.data(), call.data() + 3, result),
