@@ -49,7 +49,7 @@ void OutputWriter::redirect(ByteSink& sink) {
     target_ = sink.target();
 }
 
-void OutputWriter::writeLineFeeds(std::size_t count) {
+void OutputWriter::writeManyLineFeeds(std::size_t count) {
     while (count > 0) {
         if (used_ == kBlockSize) {
             flush();

@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -57,7 +58,15 @@ public:
     void countLines(std::size_t count) { outputLine_ = addLines(outputLine_, count); }
 
     /// Writes line feeds that are not counted: the line ends inside a comment.
-    void writeLineFeeds(std::size_t count);
+    void writeLineFeeds(std::size_t count) {
+        // All of the room that a few may take is filled: how many they are cannot be predicted.
+        if (count > kFewLineFeeds || kFewLineFeeds > kBlockSize - used_) {
+            writeManyLineFeeds(count);
+            return;
+        }
+        std::memset(&block_[used_], '\n', kFewLineFeeds);
+        used_ += count;
+    }
 
     /// Tells whether the next output line stands for the input line at `position`.
     [[nodiscard]] bool isAt(const SourcePosition& position) const noexcept {
@@ -109,7 +118,9 @@ public:
 
 private:
     static constexpr std::size_t kBlockSize = std::size_t{64} * 1024;
+    static constexpr std::size_t kFewLineFeeds = 32;
 
+    void writeManyLineFeeds(std::size_t count);
     void writeLarge(std::string_view text);
     void handOver(std::string_view text);
 
