@@ -137,26 +137,29 @@ TextReader::Pass::Outcome TextReader::Pass::passMark(TextMark mark) {
 }
 
 TextReader::Pass::Outcome TextReader::Pass::passName() {
-    const char* const at = pass_.at();
-    const char* const end = pass_.scan().nameEnd();
-    const std::string_view name(at, static_cast<std::size_t>(end - at));
-    if (name == "defined") {
-        pass_.scan().resume(end, false);  // no macro, even if there is one of this name
-        return std::nullopt;
-    }
-    const NameReader::Outcome outcome = reader_.nameReader_.readName(name, pass_.end());
-    if (outcome.end == nullptr) {
-        writeUpTo(at);
-        commit(end);
-        reader_.name_ = name;
-        return Stop::Name;
-    }
-    if (outcome.text.data() != at) {
-        writeUpTo(at);
-        output_.write(outcome.text);
-        run_ = outcome.end;
-    }
-    pass_.scan().resume(outcome.end, false);
+    std::string_view name;
+    do {
+        const char* const at = pass_.at();
+        const char* const end = pass_.scan().nameEnd();
+        name = {at, static_cast<std::size_t>(end - at)};
+        if (name == "defined") {
+            pass_.scan().resume(end, false);  // no macro, even if there is one of this name
+            return std::nullopt;
+        }
+        const NameReader::Outcome outcome = reader_.nameReader_.readName(name, pass_.end());
+        if (outcome.end == nullptr) {
+            writeUpTo(at);
+            commit(end);
+            reader_.name_ = name;
+            return Stop::Name;
+        }
+        if (outcome.text.data() != at) {
+            writeUpTo(at);
+            output_.write(outcome.text);
+            run_ = outcome.end;
+        }
+        pass_.scan().resume(outcome.end, false);
+    } while (pass_.scan().passToSame(name));
     return std::nullopt;
 }
 

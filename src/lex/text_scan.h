@@ -10,6 +10,7 @@
 #include "lex/line_start.h"
 #include "lex/literal.h"
 #include "lex/name_filter.h"
+#include "lex/spelling.h"
 #include "lex/text_map.h"
 
 namespace umpre {
@@ -70,6 +71,21 @@ public:
     void resume(const char* place, bool atLineStart) noexcept {
         at_ = place;
         lineStart_ = {place, atLineStart};
+    }
+
+    /// Tells whether the line ends here and the next one begins with this name, which is then the
+    /// mark: in lists, line after line begins with one name.
+    [[nodiscard]] bool passToSame(std::string_view name) noexcept {
+        const char* const next = at_ + 1;
+        if (*at_ != '\n' || marksLineFeeds_
+            || static_cast<std::size_t>(end_ - at_) <= name.size() + 1
+            || !isSameName({next, name.size()}, name) || isWordByte(next[name.size()])) {
+            return false;
+        }
+        ++lineFeeds_;
+        at_ = next;
+        nameEnd_ = next + name.size();
+        return true;
     }
 
 private:

@@ -76,6 +76,33 @@ TEST_F(TextScanTest, CountsLineFeeds) {
     EXPECT_EQ(lineFeeds, 4U);
 }
 
+TEST_F(TextScanTest, GoesOnWithTheNameOfTheLineBefore) {
+    // The name that stands behind the line feed, and whether a scan for MACRO goes on with it.
+    const auto goesOn = [this](std::string_view text, bool marksLineFeeds = false) {
+        memory = std::string(text) + std::string(64, '8');
+        NameFilter none;
+        LiteralFinder literals;
+        TextMap map;
+        TextScan scan(std::string_view(memory).substr(0, text.size()), false, map, literals, none);
+        scan.markLineFeeds(marksLineFeeds);
+        const bool passed = scan.passToSame("MACRO");
+        EXPECT_EQ(scan.at() - memory.data(), passed ? 1 : 0) << text;
+        EXPECT_EQ(scan.takeLineFeeds(), passed ? 1U : 0U) << text;
+        EXPECT_TRUE(!passed || scan.nameEnd() == memory.data() + 6) << text;
+        return passed;
+    };
+    EXPECT_TRUE(goesOn("\nMACRO("));
+    EXPECT_TRUE(goesOn("\nMACRO\n"));
+    EXPECT_FALSE(goesOn("\nMACRO(", true));
+    EXPECT_FALSE(goesOn("\nMACRO"));  // it may go on behind these bytes
+    EXPECT_FALSE(goesOn("\nMACRO1("));
+    EXPECT_FALSE(goesOn("\nMACRA("));
+    EXPECT_FALSE(goesOn("\nMAC("));
+    EXPECT_FALSE(goesOn("\n"));
+    EXPECT_FALSE(goesOn("\n\nMACRO("));
+    EXPECT_FALSE(goesOn("MACRO("));
+}
+
 TEST_F(TextScanTest, FindsNamesBehindNumbers) {
     names.add("e5");
     names.add("g");
