@@ -78,6 +78,15 @@ public:
         return maskOf([bytes...](Part part) noexcept { return either(equal(part, bytes)...); });
     }
 
+    /// Returns where bytes stand that, with these bits set, are any of some.
+    template <typename... Bytes>
+    [[nodiscard]] Mask anyWith(char bits, Bytes... bytes) const noexcept {
+        return maskOf([bits, bytes...](Part part) noexcept {
+            const Part changed = Vector::either(part, Vector::all(bits));
+            return either(equal(changed, bytes)...);
+        });
+    }
+
     /// Returns where ASCII letters and underscores stand.
     [[nodiscard]] Mask letters() const noexcept {
         return maskOf([](Part part) noexcept {

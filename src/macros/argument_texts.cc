@@ -89,7 +89,8 @@ private:
         if (isBlankByte(byte)) {
             return passBlanksWithin(at, depth);
         }
-        argument.mayHaveQuotes = true;
+        argument.mayHaveQuotes =
+            argument.mayHaveQuotes || byte == '"' || byte == '\'' || byte == '\\';
         const char* const behind = unusualTokenEnd(at, end_);
         if (behind != nullptr) {
             places_.resume(behind);

@@ -85,20 +85,20 @@ bool TextExpander::read(std::string_view text, const std::vector<TextBuffer::Par
     }
     const char* const end = text.data() + text.size();
     Reading reading{end, text.data(), place, TextPlaces<PlacesFor::Tokens>(text.data())};
-    for (const TextBuffer::Part& part : settled) {
+    // Behind the last part that is settled is one without bytes.
+    const TextBuffer::Part last{text.size(), text.size()};
+    for (std::size_t index = 0; index <= settled.size(); ++index) {
+        const TextBuffer::Part& part = index < settled.size() ? settled[index] : last;
         if (!readUpTo(text.data() + part.begin, reading, result)) {
             return false;
         }
         reading.places.resume(text.data() + part.end);
     }
-    if (!readUpTo(end, reading, result)) {
-        return false;
-    }
     --depth_;
     return add(viewOf(reading.run, end), result);
 }
 
-bool TextExpander::readUpTo(const char* end, Reading& reading, Result& result) {
+inline bool TextExpander::readUpTo(const char* end, Reading& reading, Result& result) {
     for (;;) {
         const char* const at = reading.places.next(end);
         if (at == end) {
@@ -295,7 +295,8 @@ bool TextExpander::addJoined(const MacroBody& body, const BodyStep& step, std::s
     const bool isLiteral = join_.isLiteral(body, step, &arguments_[firstArgument]);
     const bool isAdded =
         join_.join(body, step, &arguments_[firstArgument], kMostWork - work_, result.text);
-    const std::string_view text = result.text.view().substr(before);
+    const std::string_view whole = result.text.view();
+    const std::string_view text = viewOf(whole.data() + before, whole.data() + whole.size());
     if (!isAdded || isTooMuch(text.size()) || meets(before, result)) {
         return false;
     }
@@ -320,7 +321,7 @@ bool TextExpander::isPlain(std::string_view text, bool& hasMacros) {
 }
 
 // Tells whether the bytes that meet where something was added may belong to one token.
-inline bool TextExpander::meets(std::size_t before, const Result& result) {
+[[gnu::always_inline]] inline bool TextExpander::meets(std::size_t before, const Result& result) {
     const TextBuffer& text = result.text;
     return !result.isWritten && before > 0 && before < text.size()
            && mayMeet(text[before - 1], text[before]);
@@ -334,7 +335,7 @@ inline bool TextExpander::meets(std::size_t before, const Result& result) {
 }
 
 // The same for a part of a replacement.
-inline bool TextExpander::addCounted(std::string_view text, Result& result) {
+[[gnu::always_inline]] inline bool TextExpander::addCounted(std::string_view text, Result& result) {
     return !isTooMuch(text.size()) && add(text, result);
 }
 

@@ -95,7 +95,8 @@ private:
         if constexpr (kFor == PlacesFor::Arguments) {
             constexpr Mask kLast = Mask{1} << (Block::kSize - 1);
             const Mask spaces = bytes.any(' ') & ~(blanks >> 1U | kLast);
-            left_ |= (blanks & ~spaces) | bytes.any('"', '\'', '\\', '/', '(', ')', ',');
+            // Parentheses, commas and quotes, and what differs from them in two bits: "-#&".
+            left_ |= (blanks & ~spaces) | bytes.anyWith(5, '-', '\'') | bytes.any('\\', '/');
         } else {
             left_ |= (blanks & ~bytes.any(' ')) | bytes.any('"', '\'', '\\', '/');
         }
