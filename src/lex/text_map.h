@@ -92,9 +92,9 @@ public:
         const bool isOdd = (first->strings << 1U >> place & 1U) != 0;
         const Mask strings = isOdd == isOpen ? first->strings : ~first->strings;
         const Mask carried = 0 - (strings >> (ByteBlock::kSize - 1));
-        return {joined(first->lineFeeds, second->lineFeeds),
-                joined(first->lineEnds, second->lineEnds), joined(first->special, second->special),
-                joined(strings, second->strings ^ carried)};
+        const Mask lineEnds = joined(first->lineEnds, second->lineEnds);
+        const Mask special = joined(first->special, second->special);
+        return {lineEnds & ~special, lineEnds, special, joined(strings, second->strings ^ carried)};
     }
 
     /// Returns a number that is larger by one behind each line feed between two places.

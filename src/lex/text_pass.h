@@ -29,8 +29,11 @@ public:
     /// Returns where the file stands.
     [[nodiscard]] const char* begin() const noexcept { return begin_; }
 
-    /// Counts lines of the file that the scan did not see.
+    /// Counts lines that are none of those that the scan passes over.
     void countLines(std::size_t count) noexcept { lines_ += count; }
+
+    /// Says that one of these ended with a carriage return alone.
+    void countCarriageReturn() noexcept { ++carriageReturns_; }
 
     /// Returns the comment that begins at `comment`, as TextMap does.
     [[nodiscard]] TextMap::Comment commentAt(const char* comment) {
@@ -40,21 +43,28 @@ public:
     /// Passes over the continuation that the scan stopped at.
     void passContinuation(bool atLineStart) noexcept;
 
-    /// Tells the file that it was read up to `place`, where a token begins. Returns the line feeds
-    /// that the scan passed since the last time.
+    /// Tells the file that it was read up to `place`, where a token begins. Returns how many lines
+    /// the scan passed over since the last time.
     std::size_t commit(const char* place);
 
 private:
     TextPass(CppFileScanner& file, std::string_view text, bool atLineStart, const NameFilter& names)
         : file_(file),
           scan_(text, atLineStart, file.textMap(), file.literals(), names),
-          begin_(text.data()) {}
+          begin_(text.data()),
+          lineFeedsBefore_(text.empty() ? 0 : lineFeedsBefore(begin_)) {}
+
+    [[nodiscard]] std::size_t lineFeedsBefore(const char* place) {
+        return file_.textMap().lineFeedsBefore(place, end());
+    }
 
     CppFileScanner& file_;
     TextScan scan_;
     const char* begin_;
     const char* continued_ = nullptr;  // behind the last continuation
-    std::size_t lines_ = 0;
+    std::size_t lineFeedsBefore_;      // before begin_
+    std::size_t lines_ = 0;            // that the scan did not pass over
+    std::size_t carriageReturns_ = 0;  // line ends by themselves among these
 };
 
 }  // namespace umpre

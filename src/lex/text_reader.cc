@@ -348,6 +348,7 @@ const char* TextReader::Pass::endLine(const char* lineEnd) {
         run_ = lineEnd + 1;
         return lineEnd + 2;
     }
+    pass_.countCarriageReturn();
     output_.write("\n");
     run_ = lineEnd + 1;
     return run_;

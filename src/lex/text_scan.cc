@@ -15,6 +15,7 @@
 
 #include <algorithm>
 #include <bit>
+#include <utility>
 
 #include "lex/spelling.h"
 
@@ -90,7 +91,6 @@ TextMark TextScan::scanBlock() {
         passUnusual(block);
     }
     findNames(block);
-    lineFeeds_ += countBits(block.lineFeeds & bitsBelow(block.stop));
     at_ = block.next;
     openQuote_ = block.openQuote;
     return block.mark;
@@ -115,7 +115,7 @@ TextScan::Block TextScan::blockAt(const char* at) {
     // What stands before these 64 bytes is not known here.
     const Mask blanks = words.blanksAndUnusual & ~block.lineFeeds;
     const Mask suspects = marksLineFeeds_ ? ~Mask{0} : blanks << 1U | 1U;
-    const Mask escapedQuote = Mask{!goesOn} & Mask{*at == '"'} & Mask{at[-1] == '\\'};
+    const Mask escapedQuote = at[-1] == '\\' && !goesOn && *at == '"' ? 1 : 0;
     block.unusual = (((window.special | (block.lineFeeds & suspects)) & ~block.strings)
                      | (window.lineEnds & block.strings) | escapedQuote)
                     & inside;

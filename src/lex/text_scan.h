@@ -4,7 +4,6 @@
 
 #include <cstddef>
 #include <string_view>
-#include <utility>
 
 #include "lex/byte_block.h"
 #include "lex/line_start.h"
@@ -58,9 +57,6 @@ public:
 
     [[nodiscard]] const char* end() const noexcept { return end_; }
 
-    /// Returns the line feeds passed since the last call.
-    [[nodiscard]] std::size_t takeLineFeeds() noexcept { return std::exchange(lineFeeds_, 0); }
-
     /// Returns where the blanks before `place` begin if nothing else stands before it on its line,
     /// otherwise null.
     [[nodiscard]] const char* lineStart(const char* place) const noexcept {
@@ -82,7 +78,6 @@ public:
             || !isSameName({next, name.size()}, name) || isWordByte(next[name.size()])) {
             return false;
         }
-        ++lineFeeds_;
         at_ = next;
         nameEnd_ = next + name.size();
         return true;
@@ -115,7 +110,6 @@ private:
     TextMap& map_;
     LiteralFinder& literals_;
     const NameFilter& names_;
-    std::size_t lineFeeds_ = 0;
 };
 
 }  // namespace umpre
