@@ -63,6 +63,11 @@ public:
 
     [[nodiscard]] std::size_t size() const noexcept { return size_; }
 
+    /// Returns how many elements can be added without taking more memory.
+    [[nodiscard]] std::size_t room() const noexcept { return capacity_ - size_; }
+
+    [[nodiscard]] Element* data() noexcept { return elements_.get(); }
+
     [[nodiscard]] const Element* data() const noexcept { return elements_.get(); }
 
     [[nodiscard]] Element& operator[](std::size_t index) noexcept { return elements_.get()[index]; }

@@ -2,6 +2,7 @@
 #include "lex/literal.h"
 
 #include <algorithm>
+#include <optional>
 
 #include "lex/byte_block.h"
 #include "lex/spelling.h"
@@ -9,6 +10,25 @@
 namespace umpre {
 
 using Result = LiteralScan::Result;
+
+namespace {
+
+// Returns what a quote, a backslash or a line feed ends; nothing if the literal goes on behind it.
+[[nodiscard]] std::optional<LiteralScan> endedAt(const char* stop, char quote,
+                                                 const char* end) noexcept {
+    if (*stop == quote) {
+        return LiteralScan{Result::Closed, stop + 1};
+    }
+    if (*stop == '\n' || (stop + 1 < end && isLineEndByte(stop[1]))) {
+        return LiteralScan{Result::Open, stop};
+    }
+    if (stop + 1 >= end) {
+        return LiteralScan{Result::Cut, stop};
+    }
+    return std::nullopt;
+}
+
+}  // namespace
 
 LiteralScan scanLiteral(const char* at, const char* end) noexcept {
     using Block = BasicByteBlock<BaseVector, 32>;
@@ -23,14 +43,8 @@ LiteralScan scanLiteral(const char* at, const char* end) noexcept {
         while (stops != 0) {
             const unsigned place = firstBit(stops);
             const char* const stop = block + place;
-            if (*stop == quote) {
-                return {Result::Closed, stop + 1};
-            }
-            if (*stop == '\n' || (stop + 1 < end && isLineEndByte(stop[1]))) {
-                return {Result::Open, stop};
-            }
-            if (stop + 1 >= end) {
-                return {Result::Cut, stop};
+            if (const std::optional<LiteralScan> scan = endedAt(stop, quote, end)) {
+                return *scan;
             }
             stops &= ~(Block::Mask{3} << place);
             at = std::max(at, stop + 2);

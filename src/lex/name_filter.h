@@ -104,7 +104,8 @@ public:
     [[nodiscard]] bool mayHoldAmongBytes(std::string_view name) const noexcept {
         const std::uint32_t bit = hashOf(name) >> shift_;
         // As a pointer: folders that are built with assertions would check the index for all.
-        return (bits_.data()[bit / 64] >> bit % 64 & 1U) != 0;
+        const std::uint64_t* const bits = bits_.data();
+        return (bits[bit / 64] >> bit % 64 & 1U) != 0;
     }
 
 private:

@@ -104,8 +104,9 @@ private:
     [[gnu::noinline]] void grow(std::size_t count) {
         const std::size_t used = size();
         memory_.truncate(used);
-        (void)memory_.extend(std::max(count, used) + kBehind);
-        begin_ = &memory_[0];
+        (void)memory_.extend(count + kBehind);
+        (void)memory_.extend(memory_.room());
+        begin_ = memory_.data();
         end_ = begin_ + used;
         limit_ = begin_ + memory_.size() - kBehind;
     }

@@ -292,9 +292,9 @@ bool TextExpander::addArgument(std::size_t argument, Result& result) {
 bool TextExpander::addJoined(const MacroBody& body, const BodyStep& step, std::size_t firstArgument,
                              Result& result) {
     const std::size_t before = result.text.size();
-    const bool isLiteral = join_.isLiteral(body, step, &arguments_[firstArgument]);
-    const bool isAdded =
-        join_.join(body, step, &arguments_[firstArgument], kMostWork - work_, result.text);
+    const ArgumentText* const arguments = arguments_.data() + firstArgument;
+    const bool isLiteral = OperandJoin::isLiteral(body, step, arguments);
+    const bool isAdded = join_.join(body, step, arguments, kMostWork - work_, result.text);
     const std::string_view whole = result.text.view();
     const std::string_view text = viewOf(whole.data() + before, whole.data() + whole.size());
     if (!isAdded || isTooMuch(text.size()) || meets(before, result)) {

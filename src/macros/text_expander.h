@@ -53,9 +53,9 @@ private:
 
     // A text that is read.
     struct Reading {
-        const char* end;
-        const char* run;  // what is not added yet begins here
-        Place place;
+        const char* end = nullptr;
+        const char* run = nullptr;  // what is not added yet begins here
+        Place place = Place::Replacement;
         TextPlaces<PlacesFor::Tokens> places;
     };
 
