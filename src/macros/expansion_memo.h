@@ -18,7 +18,7 @@ namespace umpre {
 /// hangs on is defined or undefined.
 class ExpansionMemo {
 public:
-    ExpansionMemo(const MacroTable& macros, TextExpander& expander) noexcept
+    ExpansionMemo(const MacroTable& macros, TextExpander& expander)
         : macros_(macros), expander_(expander) {}
 
     /// Returns what an object-like macro comes out as; nothing if the expander does not tell. Valid
