@@ -13,17 +13,21 @@ using Result = LiteralScan::Result;
 
 namespace {
 
-// Returns what a quote, a backslash or a line feed ends; nothing if the literal goes on behind it.
-[[nodiscard]] std::optional<LiteralScan> endedAt(const char* stop, char quote,
-                                                 const char* end) noexcept {
+// Tells what a quote, a line feed or a backslash in a literal ends; nothing if the literal goes on
+// behind the backslash and what follows it.
+[[nodiscard]] std::optional<LiteralScan> scanEndingAt(const char* stop, char quote,
+                                                      const char* end) noexcept {
     if (*stop == quote) {
         return LiteralScan{Result::Closed, stop + 1};
     }
-    if (*stop == '\n' || (stop + 1 < end && isLineEndByte(stop[1]))) {
+    if (*stop == '\n') {
         return LiteralScan{Result::Open, stop};
     }
     if (stop + 1 >= end) {
         return LiteralScan{Result::Cut, stop};
+    }
+    if (isLineEndByte(stop[1])) {
+        return LiteralScan{Result::Open, stop};
     }
     return std::nullopt;
 }
@@ -43,7 +47,7 @@ LiteralScan scanLiteral(const char* at, const char* end) noexcept {
         while (stops != 0) {
             const unsigned place = firstBit(stops);
             const char* const stop = block + place;
-            if (const std::optional<LiteralScan> scan = endedAt(stop, quote, end)) {
+            if (const std::optional<LiteralScan> scan = scanEndingAt(stop, quote, end)) {
                 return *scan;
             }
             stops &= ~(Block::Mask{3} << place);

@@ -55,7 +55,7 @@ void OutputWriter::writeManyLineFeeds(std::size_t count) {
             flush();
         }
         const std::size_t now = std::min(count, kBlockSize - used_);
-        std::memset(&block_[used_], '\n', now);
+        std::memset(block_.data() + used_, '\n', now);
         used_ += now;
         count -= now;
     }
@@ -69,7 +69,7 @@ void OutputWriter::writeLineMarker(const SourcePosition& position) {
         write(markerOf(position));
         return;
     }
-    char* const begin = &block_[used_];
+    char* const begin = block_.data() + used_;
     used_ += static_cast<std::size_t>(putMarker(begin, position) - begin);
 }
 
@@ -81,7 +81,7 @@ void OutputWriter::writeLineMarker(std::int32_t line, const Snippet& markerEnd) 
         write({marker.data(), static_cast<std::size_t>(end - marker.data())});
         return;
     }
-    char* const begin = &block_[used_];
+    char* const begin = block_.data() + used_;
     char* const end = putMarkerBegin(begin, line);
     markerEnd.copyTo(end);
     used_ += static_cast<std::size_t>(end - begin) + markerEnd.size();

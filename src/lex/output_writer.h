@@ -32,7 +32,7 @@ public:
             writeLarge(text);
             return;
         }
-        used_ += text.copy(&block_[used_], text.size());
+        used_ += text.copy(block_.data() + used_, text.size());
     }
 
     /// Writes a snippet as it is.
@@ -41,7 +41,7 @@ public:
             write(snippet.text());
             return;
         }
-        snippet.copyTo(&block_[used_]);
+        snippet.copyTo(block_.data() + used_);
         used_ += snippet.size();
     }
 
@@ -64,7 +64,7 @@ public:
             writeManyLineFeeds(count);
             return;
         }
-        std::memset(&block_[used_], '\n', kFewLineFeeds);
+        std::memset(block_.data() + used_, '\n', kFewLineFeeds);
         used_ += count;
     }
 
