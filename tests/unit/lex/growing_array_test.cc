@@ -41,6 +41,18 @@ TEST(GrowingArray, KeepsWhatWasWrittenWhileItIsLarge) {
     }
 }
 
+TEST(GrowingArray, StaysWhereItIsWhileThereIsRoom) {
+    GrowingArray<char> array;
+    *array.extend(1) = 'a';
+    const char* const place = array.data();
+    const std::size_t room = array.room();
+    ASSERT_GT(room, 0U);
+    (void)array.extend(room);
+    EXPECT_EQ(array.data(), place);
+    EXPECT_EQ(array.room(), 0U);
+    EXPECT_EQ(array.size(), room + 1);
+}
+
 TEST(GrowingArray, IsEmptyAfterBeingCleared) {
     GrowingArray<char> array;
     *array.extend(1) = 'a';
