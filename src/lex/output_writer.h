@@ -124,7 +124,7 @@ private:
     void writeLarge(std::string_view text);
     void handOver(std::string_view text);
 
-    GrowingArray<char> block_;
+    GrowingArray<char> block_;  // not set to zero: it is written before it is read
     std::size_t used_ = 0;
     std::size_t blocks_ = 0;  // handed over
     std::optional<FileIdentity> target_;

@@ -16,7 +16,7 @@ namespace umpre {
 struct ArgumentText {
     /// As written, with one space between two tokens and none at the ends.
     std::string_view raw;
-    /// All that it comes out as; without bytes until it is worked out.
+    /// All that it comes out as; null until it is worked out.
     std::string_view expansion;
     bool mayHaveMacros = false;  ///< in `raw`
     bool mayHaveQuotes = false;  ///< or backslashes, in `raw`

@@ -262,9 +262,9 @@ bool TextExpander::addStep(const MacroBody& body, const BodyStep& step, std::siz
     }
 }
 
-// Returns the text that a step yields, if it does so wherever no names are watched; otherwise null.
+// Returns the text that a step yields as it stands if no names are watched; null if there is none.
 inline const std::string_view* TextExpander::textOf(const BodyStep& step,
-                                                    std::size_t firstArgument) {
+                                                    std::size_t firstArgument) const {
     if (step.kind == BodyStep::Kind::Argument) {
         const ArgumentText& argument = arguments_[firstArgument + step.first];
         return argument.mayHaveMacros ? nullptr : &argument.raw;

@@ -78,7 +78,8 @@ private:
     [[nodiscard]] bool addSettled(const MacroBody& body, std::size_t firstArgument, Result& result);
     [[nodiscard]] bool addStep(const MacroBody& body, const BodyStep& step,
                                std::size_t firstArgument, Result& result);
-    [[nodiscard]] const std::string_view* textOf(const BodyStep& step, std::size_t firstArgument);
+    [[nodiscard]] const std::string_view* textOf(const BodyStep& step,
+                                                 std::size_t firstArgument) const;
     [[nodiscard]] bool addArgument(std::size_t argument, Result& result);
     [[nodiscard]] bool addJoined(const MacroBody& body, const BodyStep& step,
                                  std::size_t firstArgument, Result& result);
