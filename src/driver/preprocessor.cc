@@ -300,6 +300,14 @@ void Preprocessor::fileResumed() {
     output_.writeLineMarker(sources_.position());
 }
 
+bool Preprocessor::gainsByNotice() const noexcept {
+    return macros_.size() > options_.manyMacros;
+}
+
+void Preprocessor::notice(std::span<const std::string_view> names) {
+    expander_.notice(names);
+}
+
 NameReader::Outcome Preprocessor::readName(std::string_view name, const char* end) {
     files_.noteAction();
     return expander_.readName(name, end);

@@ -80,6 +80,8 @@ private:
     void fileEntered() override;
     void fileEnds() override;
     void fileResumed() override;
+    [[nodiscard]] bool gainsByNotice() const noexcept override;
+    void notice(std::span<const std::string_view> names) override;
     [[nodiscard]] Outcome readName(std::string_view name, const char* end) override;
 
     void tellSource(const std::string& name);

@@ -51,7 +51,8 @@ template <typename Number>
 }
 
 /// Tells whether two names are the same. For short ones, a call would take longer.
-[[nodiscard]] inline bool isSameName(std::string_view name, std::string_view other) noexcept {
+[[nodiscard, gnu::always_inline]] inline bool isSameName(std::string_view name,
+                                                         std::string_view other) noexcept {
     const std::size_t size = name.size();
     if (size != other.size()) {
         return false;

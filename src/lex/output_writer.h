@@ -27,7 +27,7 @@ public:
     void redirect(ByteSink& sink);
 
     /// Writes text as it is. Line feeds in it are not counted.
-    void write(std::string_view text) {
+    [[gnu::always_inline]] void write(std::string_view text) {
         if (text.size() > kBlockSize - used_) {
             writeLarge(text);
             return;

@@ -15,6 +15,8 @@ struct RunOptions {
     std::size_t windowSize = std::size_t{64} * 1024;  ///< bytes of input held at a time, about
     /// For so many nanoseconds after its last change, a file is not told apart by its times.
     std::int64_t settlingTime = 20'000'000;
+    /// With more macros than these, text has the names of several looked up together.
+    std::size_t manyMacros = 4096;
     bool tellsMacros = false;  ///< each macro is expanded by itself, so that it can be told of
     static constexpr std::int64_t kAlwaysSettled = std::numeric_limits<std::int64_t>::min();
 };

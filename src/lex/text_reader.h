@@ -8,6 +8,7 @@
 #include "lex/name_filter.h"
 #include "lex/name_reader.h"
 #include "lex/output_writer.h"
+#include "lex/text_copy.h"
 #include "lex/token.h"
 
 namespace umpre {
@@ -16,12 +17,7 @@ namespace umpre {
 /// stops at everything else, at the beginning of a token.
 class TextReader {
 public:
-    /// Where reading stopped.
-    enum class Stop {
-        LineStart,  ///< before a line's first token, its blanks included, or at the end
-        InLine,     ///< within a line that has been begun
-        Name,       ///< behind a name that may be a macro, which was not copied
-    };
+    using Stop = TextCopy::Stop;
 
     TextReader(OutputWriter& output, const NameFilter& macroNames, NameReader& nameReader) noexcept
         : output_(output), macroNames_(macroNames), nameReader_(nameReader) {}
@@ -34,8 +30,6 @@ public:
     [[nodiscard]] Token name() const noexcept { return {TokenKind::IDENTIFIER, name_}; }
 
 private:
-    class Pass;
-
     OutputWriter& output_;
     const NameFilter& macroNames_;
     NameReader& nameReader_;

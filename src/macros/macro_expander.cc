@@ -28,14 +28,10 @@ using enum TokenKind;
 
 NameReader::Outcome MacroExpander::readName(std::string_view name, const char* end) {
     const char* const behind = name.data() + name.size();
-    // Lists call one macro again and again.
-    if (lastRead_ == nullptr || !isSameName(lastRead_->text, name) || !lastRead_->isDefined) {
-        lastRead_ = macros_.find(name);
-        if (lastRead_ == nullptr) {
-            return {name, behind};
-        }
+    const MacroName* const macro = macroToRead(name);
+    if (macro == nullptr) {
+        return {name, behind};
     }
-    const MacroName* const macro = lastRead_;
     if (macro->macro.functionLike()) {
         call_.clear();
         const char* const callEnd = texts_.expandCall(*macro, behind, end, call_);
@@ -43,6 +39,27 @@ NameReader::Outcome MacroExpander::readName(std::string_view name, const char* e
     }
     const std::optional<std::string_view> text = memo_.textOf(*macro);
     return text ? NameReader::Outcome{*text, behind} : NameReader::Outcome{{}, nullptr};
+}
+
+// Returns the macro of this name, or null. Lists call one macro again and again.
+const MacroName* MacroExpander::macroToRead(std::string_view name) {
+    if (nextNoticed_ < noticed_.size()) {
+        lastRead_ = noticed_[nextNoticed_].entry;
+        ++nextNoticed_;
+    }
+    if (lastRead_ == nullptr || !isSameName(lastRead_->text, name)) {
+        lastRead_ = macros_.findEntry(name);
+    }
+    return lastRead_ != nullptr && lastRead_->isDefined ? lastRead_ : nullptr;
+}
+
+void MacroExpander::notice(std::span<const std::string_view> names) {
+    noticed_.resize(names.size());
+    for (std::size_t index = 0; index < names.size(); ++index) {
+        noticed_[index].name = names[index];
+    }
+    nextNoticed_ = 0;
+    macros_.prefetchUses(noticed_);
 }
 
 std::string_view MacroExpander::expandName(const Token& token) {

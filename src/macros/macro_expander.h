@@ -54,6 +54,9 @@ public:
     /// Reads a name in a file's text, as bytes.
     [[nodiscard]] NameReader::Outcome readName(std::string_view name, const char* end);
 
+    /// Says which names will be read next.
+    void notice(std::span<const std::string_view> names);
+
     /// Takes a name that was just read and returns what is to be written for it: the name itself,
     /// perhaps with blanks before it, a replacement that holds no macros, or nothing when a
     /// replacement was pushed. Valid until the next call and the next token read.
@@ -77,6 +80,7 @@ private:
         Abandoned,  // an invocation with the wrong arguments: the name is left
     };
 
+    [[nodiscard]] const MacroName* macroToRead(std::string_view name);
     [[nodiscard]] MacroName* entryOf(const Token& token);
     [[nodiscard]] Outcome lookAt(MacroName* name);
     void refresh(MacroName& name);
@@ -118,6 +122,8 @@ private:
     std::string written_;
     TextBuffer call_;
     const MacroName* lastRead_ = nullptr;
+    std::vector<MacroTable::Sought> noticed_;
+    std::size_t nextNoticed_ = 0;
     SharedText text_;
 };
 

@@ -28,6 +28,13 @@ constexpr std::size_t kCacheLine = 64;
     return names.empty() ? 0 : static_cast<std::uint32_t>(commas) + 1;
 }
 
+// Asks for what a use looks at.
+inline void prefetchEntry(const MacroName& entry) noexcept {
+    const auto* const place = static_cast<const char*>(static_cast<const void*>(&entry));
+    __builtin_prefetch(place + kCacheLine);
+    __builtin_prefetch(place + 2 * kCacheLine);
+}
+
 }  // namespace
 
 MacroTable::MacroTable() : slots_(kFirstSlots, &pages_), unknown_(1) {}
@@ -157,11 +164,47 @@ void MacroTable::tellDefined(const MacroName& name) {
     }
 }
 
+// Each loop asks for what the next one looks at, of all names before it is needed of any.
+void MacroTable::prefetchUses(std::span<Sought> names) noexcept {
+    for (Sought& sought : names) {
+        sought.hash = hashOfName(sought.name);
+        __builtin_prefetch(&slots_[sought.hash & (slots_.size() - 1)]);
+    }
+    for (Sought& sought : names) {
+        sought.entry = firstWith(sought.hash);
+    }
+    for (const Sought& sought : names) {
+        if (sought.entry != nullptr) {
+            const std::string_view text = sought.entry->expansion.text.data() != nullptr
+                                              ? sought.entry->expansion.text
+                                              : sought.entry->macro.text();
+            __builtin_prefetch(text.data());
+            __builtin_prefetch(text.data() + text.size());
+        }
+    }
+}
+
 void MacroTable::noteChange(std::string_view name) {
     if (watched_.size() > 0 && watched_.mayHold(name)) {
         watched_.clear();
         ++version_;
     }
+}
+
+// Returns the first entry with a hash, which is asked for; null if there is none.
+inline MacroName* MacroTable::firstWith(std::uint32_t hash) noexcept {
+    const std::size_t mask = slots_.size() - 1;
+    std::size_t at = hash & mask;
+    while (slots_[at].number != 0 && slots_[at].hash != hash) {
+        at = (at + 1) & mask;
+    }
+    if (slots_[at].number == 0) {
+        return nullptr;
+    }
+    MacroName& entry = nameIn(slots_[at]);
+    __builtin_prefetch(&entry);
+    prefetchEntry(entry);
+    return &entry;
 }
 
 inline std::size_t MacroTable::slotOf(std::string_view name, std::uint32_t hash) {
@@ -176,9 +219,7 @@ inline std::size_t MacroTable::slotOf(std::string_view name, std::uint32_t hash)
 // Tells whether a slot is that of a name. What a use looks at is asked for at once.
 bool MacroTable::holds(Slot slot, std::string_view name) {
     const MacroName& entry = nameIn(slot);
-    const auto* const place = static_cast<const char*>(static_cast<const void*>(&entry));
-    __builtin_prefetch(place + kCacheLine);
-    __builtin_prefetch(place + 2 * kCacheLine);
+    prefetchEntry(entry);
     return isSameName(entry.text, name);
 }
 

@@ -6,6 +6,7 @@
 #include <cstdint>
 #include <deque>
 #include <memory_resource>
+#include <span>
 #include <string_view>
 #include <vector>
 
@@ -70,6 +71,19 @@ public:
         __builtin_prefetch(&slots_[hashOfName(name) & (slots_.size() - 1)]);
     }
 
+    /// Returns how many names were entered.
+    [[nodiscard]] std::size_t size() const noexcept { return nameCount_; }
+
+    /// A name that will be looked for soon, and the entry that is probably its own.
+    struct Sought {
+        std::string_view name;
+        MacroName* entry = nullptr;
+        std::uint32_t hash = 0;
+    };
+
+    /// Asks for what uses of some names look at, waiting for memory once for all of them.
+    void prefetchUses(std::span<Sought> names) noexcept;
+
     /// Removes a name; does nothing if it is not defined.
     void undefine(std::string_view name);
 
@@ -111,6 +125,7 @@ private:
         return *static_cast<MacroName*>(place);
     }
 
+    [[nodiscard]] MacroName* firstWith(std::uint32_t hash) noexcept;
     [[nodiscard]] std::size_t slotOf(std::string_view name, std::uint32_t hash);
     [[nodiscard]] bool holds(Slot slot, std::string_view name);
     [[nodiscard]] MacroName& enter(std::string_view name);

@@ -121,10 +121,12 @@ void expectSameOnAllRoads(std::string_view text) {
     expectSameEvents(text, expected);
     for (const bool plainRoad : {true, false}) {
         for (const std::size_t windowSize : kWindowSizes) {
-            const RunOptions options{plainRoad, windowSize, RunOptions::kAlwaysSettled};
+            RunOptions options{plainRoad, windowSize, RunOptions::kAlwaysSettled};
+            options.manyMacros = 0;
             EXPECT_EQ(fileOutcome(fileName, options), expected)
                 << ::testing::PrintToString(text) << ", plain road " << plainRoad << ", window "
                 << windowSize;
+            options.manyMacros = RunOptions{}.manyMacros;
             EXPECT_EQ(textOutcome(text, options), expected)
                 << ::testing::PrintToString(text) << " as a text, plain road " << plainRoad
                 << ", window " << windowSize;

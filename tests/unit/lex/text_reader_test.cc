@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <array>
 #include <cstddef>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -23,6 +24,14 @@ constexpr auto kWindowSizes = std::to_array<std::size_t>({1, 2, 3, 7, 64 * 1024}
 
 // Tells what becomes of "KNOWN" and, up to its ")", of "CALL(...)", and of no other name.
 struct MacroOfOneText : NameReader {
+    explicit MacroOfOneText(bool gainsSo) : gains(gainsSo) {}
+
+    [[nodiscard]] bool gainsByNotice() const noexcept override { return gains; }
+
+    void notice(std::span<const std::string_view> names) override {
+        noticed.insert(noticed.end(), names.begin(), names.end());
+    }
+
     [[nodiscard]] Outcome readName(std::string_view name, const char* end) override {
         const char* const behind = name.data() + name.size();
         const char* const close = std::find(behind, end, ')');
@@ -33,11 +42,15 @@ struct MacroOfOneText : NameReader {
                : name == "OTHER" ? Outcome{name, behind}
                                  : Outcome{{}, nullptr};
     }
+
+    bool gains;
+    std::vector<std::string> noticed;
 };
 
 // A file whose text is copied. MACRO is a name that may be a macro's, and is not told.
 struct Reading : testing::FileFixture {
-    Reading(std::string_view text, std::size_t windowSize) : FileFixture(text, windowSize) {
+    Reading(std::string_view text, std::size_t windowSize, bool givesNotice = false)
+        : FileFixture(text, windowSize), macros(givesNotice) {
         for (const char* const name : {"MACRO", "defined", "KNOWN", "CALL", "OTHER"}) {
             names.add(name);
         }
@@ -55,21 +68,26 @@ struct Row {
     std::string_view next;
 };
 
+void expectCopy(const Row& row, std::size_t windowSize, bool givesNotice, Stop stop) {
+    SCOPED_TRACE(::testing::Message() << ::testing::PrintToString(row.text) << ", window "
+                                      << windowSize << ", gives notice " << givesNotice);
+    Reading reading(row.text, windowSize, givesNotice);
+    ASSERT_TRUE(reading.isOpen);
+    EXPECT_EQ(reading.reader.copyText(reading.file, Stop::LineStart), stop);
+    EXPECT_EQ(reading.written(), row.written);
+    EXPECT_TRUE(reading.isInStep());
+    if (stop == Stop::Name) {
+        EXPECT_EQ(reading.reader.name().text, row.next);
+    } else {
+        EXPECT_EQ(reading.file.next().text, row.next);
+    }
+}
+
 void expectCopies(const std::vector<Row>& table, Stop stop) {
     for (const Row& row : table) {
         for (const std::size_t windowSize : {std::size_t{64}, std::size_t{65'536}}) {
-            SCOPED_TRACE(::testing::Message()
-                         << ::testing::PrintToString(row.text) << ", window " << windowSize);
-            Reading reading(row.text, windowSize);
-            ASSERT_TRUE(reading.isOpen);
-            EXPECT_EQ(reading.reader.copyText(reading.file, Stop::LineStart), stop);
-            EXPECT_EQ(reading.written(), row.written);
-            EXPECT_TRUE(reading.isInStep());
-            if (stop == Stop::Name) {
-                EXPECT_EQ(reading.reader.name().text, row.next);
-            } else {
-                EXPECT_EQ(reading.file.next().text, row.next);
-            }
+            expectCopy(row, windowSize, false, stop);
+            expectCopy(row, windowSize, true, stop);
         }
     }
 }
@@ -144,9 +162,38 @@ TEST(TextReader, WritesWhatNamesComeOutAs) {
             {"a OTHER b\n", "a OTHER b\n", ""},
             {"CALL(1)CALL(KNOWN) CALL(\")\n", "<call><call> <call>\n", ""},
             {"CALL() /* x */ KNOWN\n\nKNOWN\n", "<call>   <known>\n\n<known>\n", ""},
+            {"KNOWN KNOWN CALL (KNOWN) KNOWN\n", "<known> <known> <call> <known>\n", ""},
+            {"KNOWN OTHER defined KNOWN\n", "<known> OTHER defined <known>\n", ""},
+            {"KNOWN KNOWN /* x */\n \nKNOWN\n", "<known> <known>  \n\n<known>\n", ""},
+            {"KNOWN KNOWN\r\nKNOWN \r KNOWN\n", "<known> <known>\n<known> \n <known>\n", ""},
         },
         Stop::LineStart);
-    expectCopies({{"KNOWN CALL(1\n", "<known> ", "CALL"}}, Stop::Name);
+    expectCopies(
+        {
+            {"KNOWN CALL(1\n", "<known> ", "CALL"},
+            {"KNOWN KNOWN MACRO KNOWN\n", "<known> <known> ", "MACRO"},
+        },
+        Stop::Name);
+}
+
+TEST(TextReader, GivesNoticeOfNamesThatFollowOneAsItStands) {
+    Reading reading("KNOWN KNOWN a OTHER\nKNOWN CALL(x) KNOWN OTHER\n", 1024, true);
+    EXPECT_EQ(reading.reader.copyText(reading.file, Stop::LineStart), Stop::LineStart);
+    EXPECT_EQ(reading.macros.noticed,
+              (std::vector<std::string>{"KNOWN", "OTHER", "KNOWN", "CALL", "OTHER"}));
+}
+
+TEST(TextReader, ReadsAsManyNamesInALineAsThereAre) {
+    for (std::size_t count = 1; count < 30; ++count) {
+        std::string text;
+        std::string written;
+        for (std::size_t index = 0; index < count; ++index) {
+            text += index % 7 == 6 ? "OTHER x " : "KNOWN ";
+            written += index % 7 == 6 ? "OTHER x " : "<known> ";
+        }
+        expectCopies({Row{text + "\n", written + "\n", ""}}, Stop::LineStart);
+        expectCopies({Row{text + "MACRO\n", written, "MACRO"}}, Stop::Name);
+    }
 }
 
 TEST(TextReader, StopsAtANameRightBehindANumber) {

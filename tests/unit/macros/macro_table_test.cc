@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "macros/macro_table.h"
 
+#include <array>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -204,6 +205,20 @@ TEST(MacroTable, HoldsThousandsOfNames) {
                                                        : std::to_string(number);
         EXPECT_EQ(definitionOf(macros, nameOf(number)), expected);
     }
+}
+
+TEST(MacroTable, FindsTheEntriesOfNamesAskedForTogether) {
+    MacroTable macros;
+    for (const char* const name : {"A", "B", "C"}) {
+        macros.define(name, objectLike("1"));
+    }
+    macros.undefine("B");
+    std::array<MacroTable::Sought, 4> names{{{"C"}, {"none"}, {"A"}, {"B"}}};
+    macros.prefetchUses(names);
+    for (const MacroTable::Sought& sought : names) {
+        EXPECT_EQ(sought.entry, macros.findEntry(sought.name)) << sought.name;
+    }
+    macros.prefetchUses({});
 }
 
 TEST(MacroTable, HoldsNamesOfAllSizes) {
