@@ -112,7 +112,8 @@ private:
         if (static_cast<std::size_t>(place - begin_) >= size_) {
             cover(place, end);
         }
-        return masks_[static_cast<std::size_t>(place - begin_) / ByteBlock::kSize];
+        // Too often to check the place each time.
+        return masks_.data()[static_cast<std::size_t>(place - begin_) / ByteBlock::kSize];
     }
 
     [[nodiscard]] const char* placeOf(const TextMasks& masks) const noexcept {

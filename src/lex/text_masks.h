@@ -8,8 +8,9 @@
 namespace umpre {
 
 /// Where what matters in text stands among 64 bytes: in each mask, bit N stands for byte N.
-/// "Escaped" is what stands behind an odd number of backslashes.
-struct TextMasks {
+/// "Escaped" is what stands behind an odd number of backslashes. Aligned to a power of two, so that
+/// the masks of a block are found by a shift.
+struct alignas(64) TextMasks {
     using Mask = std::uint64_t;
 
     Mask lineFeeds;
