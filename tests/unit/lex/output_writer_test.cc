@@ -96,6 +96,22 @@ TEST_F(OutputWriterTest, WritesManyLineFeeds) {
     EXPECT_EQ(written(), "a" + std::string(kMuch, '\n') + "b");
 }
 
+TEST_F(OutputWriterTest, WritesAFewLineFeedsWhereverABlockEnds) {
+    for (std::size_t before = 65'500; before <= 65'540; ++before) {
+        for (const std::size_t count : {1U, 31U, 32U, 33U}) {
+            RecordingSink other;
+            OutputWriter writer;
+            writer.redirect(other);
+            const std::string text(before, 'x');
+            writer.write(text);
+            writer.writeLineFeeds(count);
+            writer.write("b");
+            writer.flush();
+            ASSERT_EQ(other.bytes(), text + std::string(count, '\n') + "b") << before << count;
+        }
+    }
+}
+
 TEST_F(OutputWriterTest, CountsTheLinesThatItEnds) {
     output.writeLineMarker({"f", 5});
     output.endLine();
