@@ -89,17 +89,17 @@ private:
         std::swap(capacity_, other.capacity_);
     }
 
-    // A large array grows by less, and has the pages at once that it grows by.
+    // An array of many pages has those at once that it grows by, and a large one grows by less.
     void grow(std::size_t needed) {
         constexpr std::size_t kFirst = 32 / sizeof(Element);
+        constexpr std::size_t kManyPages = (std::size_t{64} << 10U) / sizeof(Element);
         constexpr std::size_t kLarge = (std::size_t{256} << 10U) / sizeof(Element);
-        if (needed < kLarge) {
-            setCapacity(std::max({needed, 2 * capacity_, kFirst}));
-            return;
-        }
         const std::size_t before = capacity_;
-        setCapacity(needed + needed / 4);
-        requestPages(elements_.get() + before, (capacity_ - before) * sizeof(Element));
+        setCapacity(needed < kLarge ? std::max({needed, 2 * capacity_, kFirst})
+                                    : needed + needed / 4);
+        if (needed > kManyPages) {
+            requestPages(elements_.get() + before, (capacity_ - before) * sizeof(Element));
+        }
     }
 
     // A large array grows where its pages are: nothing is copied.
